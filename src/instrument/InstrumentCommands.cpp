@@ -1,0 +1,7 @@
+#include "instrument/InstrumentCommands.h"
+
+#include "shell/MainWindow.h"
+
+InstrumentCommands::InstrumentCommands(MainWindow& window) : QObject(&window), w_(window) {}
+
+void InstrumentCommands::QueryStatus() {}
