@@ -1,0 +1,327 @@
+#include "instrument/StatusReply.h"
+
+#include <QTest>
+
+using Format = StatusReply::Format;
+Q_DECLARE_METATYPE(StatusReply::Format)
+
+namespace {
+// "~" in a table stands for "not delivered: the caller keeps its previous value".
+const QString keep = QStringLiteral("~");
+constexpr int keepCount = -1;
+
+QString shown(const std::optional<QString>& field) {
+    return field.value_or(keep);
+}
+int shown(const std::optional<qint32>& count) {
+    return count.value_or(keepCount);
+}
+QString latin1(const char* bytes) {
+    return QString::fromLatin1(bytes);
+}
+} // namespace
+
+class StatusReplyTest : public QObject {
+    Q_OBJECT
+private slots:
+    void fields_data();
+    void fields();
+    void flags_data();
+    void flags();
+    void versionReply_data();
+    void versionReply();
+    void count_data();
+    void count();
+};
+
+void StatusReplyTest::fields_data() {
+    QTest::addColumn<QString>("reply");
+    QTest::addColumn<QString>("current");
+    QTest::addColumn<Format>("format");
+    QTest::addColumn<QString>("model");
+    QTest::addColumn<QString>("version");
+    QTest::addColumn<QString>("serial");
+    QTest::addColumn<int>("logged");
+    QTest::addColumn<QString>("capabilities");
+
+    // K5 family: count = first digit run from the third character on.
+    QTest::newRow("K5AC count and letters") << "K5AC 0012 +m\r"
+                                            << "" << Format::K5 << "K5AC"
+                                            << ""
+                                            << "" << 12 << "K5AC 0012 +m\r";
+    QTest::newRow("K5ACMV word") << "K5ACMVX 0001\r"
+                                 << "" << Format::K5 << "K5ACMV"
+                                 << ""
+                                 << "" << 1 << "K5ACMVX 0001\r";
+    QTest::newRow("K5GJ beats K5G") << "K5GJX 0005\r"
+                                    << "" << Format::K5 << "K5GJ"
+                                    << ""
+                                    << "" << 5 << "K5GJX 0005\r";
+    QTest::newRow("K5AD shown as K5ACMV") << "K5ADX 0007\r"
+                                          << "" << Format::K5 << "K5ACMV"
+                                          << ""
+                                          << "" << 7 << "K5ADX 0007\r";
+    // The count is the first digit run, even one inside the model word.
+    QTest::newRow("digit in model word") << "K5G2 0007\r"
+                                         << "" << Format::K5 << "K5G"
+                                         << ""
+                                         << "" << 2 << "K5G2 0007\r";
+    QTest::newRow("K5 unknown word kept") << "K5XYZ 3\r"
+                                          << "" << Format::K5 << "K5XYZ"
+                                          << ""
+                                          << "" << 3 << "K5XYZ 3\r";
+    QTest::newRow("K5AH serial") << "K5AH 0034 +m 12345\r"
+                                 << "" << Format::K5 << "K5AH"
+                                 << ""
+                                 << "12345" << 34 << "K5AH 0034 +m 12345\r";
+    QTest::newRow("K5 without CR") << "K5AC 0012 +m"
+                                   << "" << Format::K5 << "K5AC"
+                                   << ""
+                                   << "" << 12 << "K5AC 0012 +m";
+    QTest::newRow("K5 no digits") << "K5AC +m\r"
+                                  << "" << Format::K5 << "K5AC"
+                                  << ""
+                                  << "" << keepCount << "K5AC +m\r";
+    QTest::newRow("K5 count overflow") << "K5AC 99999999999 \r"
+                                       << "" << Format::K5 << "K5AC"
+                                       << ""
+                                       << "" << keepCount << "K5AC 99999999999 \r";
+    QTest::newRow("K5 no space keeps model") << "K5\r"
+                                             << "K5G" << Format::K5 << keep << ""
+                                             << "" << keepCount << "K5\r";
+    QTest::newRow("K5AH too short for serial") << "K5AH\r"
+                                               << "K5AH" << Format::K5 << keep << ""
+                                               << "" << keepCount << "K5AH\r";
+
+    // Plain: count = four characters before the last one.
+    QTest::newRow("plain K50") << "K50 1.05 A1234 0012\r"
+                               << "" << Format::Plain << "K50"
+                               << "1.05"
+                               << "A1234" << 12 << "";
+    QTest::newRow("plain two spaces") << "K50  1.05  A1234  0012\r"
+                                      << "" << Format::Plain << "K50"
+                                      << "1.05"
+                                      << "A1234" << 12 << "";
+    QTest::newRow("plain K51 no count") << "K51 V1.2 SN0001 9999\r"
+                                        << "" << Format::Plain << "K51"
+                                        << "V1.2"
+                                        << "SN0001" << keepCount << "";
+    QTest::newRow("plain count not a number") << "K50 1.0 S1 00x2\r"
+                                              << "" << Format::Plain << "K50"
+                                              << "1.0"
+                                              << "S1" << keepCount << "";
+    QTest::newRow("plain serial without space") << "K51 1.0 S1"
+                                                << "" << Format::Plain << "K51"
+                                                << "1.0" << keep << keepCount << "";
+    QTest::newRow("plain too short")
+        << "K50\r"
+        << "OLD" << Format::Plain << keep << keep << keep << keepCount << "";
+    QTest::newRow("plain QR34 word") << "QR34X 2.0 S77 0005\r"
+                                     << "" << Format::Plain << "QR34X"
+                                     << "2.0"
+                                     << "S77" << 5 << "";
+    QTest::newRow("ZUM410 second word")
+        << "ZUM410 0042 \r"
+        << "" << Format::Plain << "QR32" << keep << keep << 42 << "";
+    QTest::newRow("QR32 second word") << "QR32 0100 xyz\r"
+                                      << "" << Format::Plain << "QR32" << keep << keep << 100 << "";
+    QTest::newRow("QR32 second word unclosed")
+        << "QR32 0100\r"
+        << "" << Format::Plain << "QR32" << keep << keep << keepCount << "";
+    QTest::newRow("high bytes") << latin1("K50 \xe9\xff"
+                                          "1 S\x80 0012\r")
+                                << "" << Format::Plain << "K50"
+                                << latin1("\xe9\xff"
+                                          "1")
+                                << latin1("S\x80") << 12 << "";
+    QTest::newRow("control characters") << latin1("K50 1.0\t\x01 S1 0012\r") << "" << Format::Plain
+                                        << "K50" << latin1("1.0\t\x01") << "S1" << 12 << "";
+
+    // Percent: exactly one space between fields, then letters, "%", one letter.
+    QTest::newRow("percent with log") << "P200 2.1 S2 0042 +v%g\r"
+                                      << "" << Format::Percent << "P200"
+                                      << "2.1"
+                                      << "S2" << 42 << "+v";
+    QTest::newRow("percent n: no count") << "P100 1.0 S1 +m%n\r"
+                                         << "" << Format::Percent << "P100"
+                                         << "1.0"
+                                         << "S1" << keepCount << "+m";
+    QTest::newRow("percent l: no count") << "P100 1.0 S1 9999 v%l\r"
+                                         << "" << Format::Percent << "P100"
+                                         << "1.0"
+                                         << "S1" << keepCount << "9999 v";
+    QTest::newRow("percent two spaces") << "P100  1.0 S1 0004 +%g\r"
+                                        << "" << Format::Percent << "P100"
+                                        << ""
+                                        << "1.0" << keepCount << "0004 +";
+    QTest::newRow("percent truncated")
+        << "P1%g"
+        << "OLD" << Format::Percent << keep << keep << keep << keepCount << "P1";
+    QTest::newRow("percent sign first")
+        << "%n\r"
+        << "" << Format::Percent << keep << keep << keep << keepCount << "";
+    QTest::newRow("percent only in a field") << "P1 1% S1 0003\r"
+                                             << "" << Format::Percent << "P1"
+                                             << "1%"
+                                             << "S1" << keepCount << "";
+
+    // Unusable and error replies change nothing.
+    QTest::newRow("busy") << "BUSY\r"
+                          << "" << Format::Unusable << keep << keep << keep << keepCount << "";
+    QTest::newRow("busy any case")
+        << "K50 busy\r"
+        << "" << Format::Unusable << keep << keep << keep << keepCount << "";
+    QTest::newRow("exit") << "EXIT\r"
+                          << "" << Format::Unusable << keep << keep << keep << keepCount << "";
+    QTest::newRow("empty") << ""
+                           << "" << Format::Unusable << keep << keep << keep << keepCount << "";
+    QTest::newRow("error") << "ERROR\r"
+                           << "" << Format::Error << keep << keep << keep << keepCount << "";
+}
+
+void StatusReplyTest::fields() {
+    QFETCH(QString, reply);
+    QFETCH(QString, current);
+    const StatusReply r = parseStatusReply(reply, current);
+    QTEST(r.format, "format");
+    QTEST(shown(r.modelCode), "model");
+    QTEST(shown(r.firmwareVersion), "version");
+    QTEST(shown(r.serialNumber), "serial");
+    QTEST(shown(r.numLogged), "logged");
+    QTEST(r.capabilityText, "capabilities");
+}
+
+void StatusReplyTest::flags_data() {
+    QTest::addColumn<QString>("reply");
+    QTest::addColumn<QString>("current");
+    QTest::addColumn<bool>("k5");
+    QTest::addColumn<bool>("log");
+    QTest::addColumn<bool>("glp");
+    QTest::addColumn<bool>("autoLog");
+    QTest::addColumn<bool>("stir");
+    QTest::addColumn<bool>("voltage");
+    QTest::addColumn<bool>("batteryLow");
+    QTest::addColumn<bool>("versionQuery");
+
+    QTest::newRow("K5AC") << "K5AC 0012 +m\r"
+                          << "" << true << true << false << true << true << false << false << false;
+    QTest::newRow("K5AH") << "K5AH 0034 + 12345\r"
+                          << "" << true << true << true << true << false << false << false << false;
+    QTest::newRow("K5AH low battery")
+        << "K5AH 0034 +B 12345\r"
+        << "" << true << true << true << true << false << false << true << false;
+    // Letters match in either case, anywhere in a K5 reply.
+    QTest::newRow("K5ACMV stirrer by case")
+        << "K5ACMV 0003\r"
+        << "" << true << true << false << false << true << true << false << false;
+    QTest::newRow("K5 no space uses held model")
+        << "K5\r"
+        << "K5AH" << true << true << true << false << false << false << false << false;
+    QTest::newRow("K51 plain") << "K51 V1 S1 0001\r"
+                               << "" << false << false << false << false << false << false << false
+                               << false;
+    QTest::newRow("K50 plain") << "K50 V1 S1 0001\r"
+                               << "" << false << true << true << false << false << false << false
+                               << false;
+    QTest::newRow("plain letters ignored")
+        << "K50 +m S1 B001\r"
+        << "" << false << true << true << false << false << false << false << false;
+    QTest::newRow("QR32") << "QR32 0001 \r"
+                          << "" << false << true << false << false << false << false << false
+                          << true;
+    QTest::newRow("ZUM410") << "ZUM410 0042 \r"
+                            << "" << false << true << false << false << false << false << false
+                            << true;
+    QTest::newRow("unreadable plain held K51")
+        << "AB\r"
+        << "K51" << false << false << false << false << false << false << false << false;
+    QTest::newRow("percent n") << "P1 1 S +m%n\r"
+                               << "" << false << false << false << true << true << false << false
+                               << false;
+    QTest::newRow("percent g") << "P1 1 S 5 v%g\r"
+                               << "" << false << true << false << false << false << true << false
+                               << false;
+    QTest::newRow("percent l") << "P1 1 S Vb%l\r"
+                               << "" << false << false << true << false << false << true << true
+                               << false;
+    QTest::newRow("percent upper N is neither")
+        << "P1 1 S 5 %N\r"
+        << "" << false << true << true << false << false << false << false << false;
+    QTest::newRow("percent K5 family")
+        << "K5XP 1 S 5 M%\r"
+        << "" << true << true << true << false << true << false << false << false;
+    QTest::newRow("percent K50 not family")
+        << "K50P 1 S 5 %g\r"
+        << "" << false << true << false << false << false << false << false << false;
+}
+
+void StatusReplyTest::flags() {
+    QFETCH(QString, reply);
+    QFETCH(QString, current);
+    const StatusReply r = parseStatusReply(reply, current);
+    QTEST(r.isK5Family, "k5");
+    QTEST(r.hasLog, "log");
+    QTEST(r.hasGLP, "glp");
+    QTEST(r.canAutoLog(), "autoLog");
+    QTEST(r.canStir(), "stir");
+    QTEST(r.reportsVoltage(), "voltage");
+    QTEST(r.batteryLow(), "batteryLow");
+    QTEST(r.needsVersionQuery, "versionQuery");
+}
+
+void StatusReplyTest::versionReply_data() {
+    QTest::addColumn<QString>("reply");
+    QTest::addColumn<QString>("version");
+    QTest::addColumn<QString>("serial");
+    QTest::newRow("full") << "QR32VER 1.5 A12345\r"
+                          << "1.5"
+                          << "A12345";
+    QTest::newRow("exactly 18") << "QR32VER 1.5 A12345"
+                                << "1.5"
+                                << "A12345";
+    QTest::newRow("17 characters") << "QR32VER 1.5 A1234"
+                                   << ""
+                                   << "";
+    QTest::newRow("empty") << ""
+                           << ""
+                           << "";
+    QTest::newRow("high bytes") << latin1("\xff\xff\xff\xff\xff\xff\xff\xff\xe9\x01"
+                                          "2 "
+                                          "\x80\x81\x82\x83\x84\x85\r")
+                                << latin1("\xe9\x01"
+                                          "2")
+                                << latin1("\x80\x81\x82\x83\x84\x85");
+}
+
+void StatusReplyTest::versionReply() {
+    QFETCH(QString, reply);
+    StatusReply r = parseStatusReply("ZUM410 0042 \r", "");
+    parseVersionReply(reply, r);
+    QTEST(shown(r.firmwareVersion), "version");
+    QTEST(shown(r.serialNumber), "serial");
+}
+
+void StatusReplyTest::count_data() {
+    QTest::addColumn<QString>("field");
+    QTest::addColumn<int>("value");
+    QTest::newRow("leading zeros") << "0042" << 42;
+    QTest::newRow("padded") << "  12" << 12;
+    QTest::newRow("zero") << "0000" << 0;
+    QTest::newRow("empty") << "" << keepCount;
+    QTest::newRow("spaces") << "    " << keepCount;
+    QTest::newRow("letter") << "00x2" << keepCount;
+    QTest::newRow("sign") << "-012" << keepCount;
+    QTest::newRow("plus") << "+012" << keepCount;
+    QTest::newRow("inner space") << "0 12" << keepCount;
+    QTest::newRow("superscript") << latin1("\xb2\xb3") << keepCount;
+    QTest::newRow("overflow") << "99999999999" << keepCount;
+    QTest::newRow("largest") << "2147483647" << 2147483647;
+}
+
+void StatusReplyTest::count() {
+    QFETCH(QString, field);
+    QTEST(shown(parseCount(field)), "value");
+}
+
+QTEST_APPLESS_MAIN(StatusReplyTest)
+#include "StatusReply_test.moc"
