@@ -66,6 +66,8 @@ private slots:
     void vanishMidTransfer();
     void recordsReceivedBytes();
     void pacingSlowsReplies();
+    void endlessSendingUntilStopped();
+    void qr32VanishMidTransfer();
     void powerOffSleepsUntilWakeUp();
 };
 
@@ -249,6 +251,8 @@ void MeterTest::logLayouts() {
     const QList<QByteArray> log = Meter::generateLog(metersim::profile(name), 10000);
     QCOMPARE(log.size(), 10000);
     QCOMPARE(log.first().chopped(1).right(dateLength), dateStart);
+    // The record number wraps instead of widening the line.
+    QCOMPARE(log.last().left(5), QByteArray("0000 "));
     bool sawPpk = false, sawAsterisk = false, sawMs = false;
     for (const QByteArray& r : log) {
         QVERIFY(r.endsWith('\r'));
@@ -324,6 +328,34 @@ void MeterTest::pacingSlowsReplies() {
     // 11 bytes at 1200 baud take at least 90 ms.
     QCOMPARE(port.exchange("?S\r"), QByteArray("QR32 0003 \r"));
     QVERIFY(timer.elapsed() >= 80);
+}
+
+void MeterTest::endlessSendingUntilStopped() {
+    Meter meter(metersim::profile("plain"));
+    QVERIFY(meter.start());
+    Port port(meter.portPath());
+    meter.startEndlessSending();
+    for (int i = 0; i < 50; ++i)
+        QVERIFY(port.readLine().endsWith('\r'));
+    meter.stopEndlessSending();
+    // Whatever was already queued drains, then the line goes quiet.
+    while (!port.readLine(200).isEmpty()) {
+    }
+    QCOMPARE(port.exchange("?S\r"), QByteArray("CD200 V1.21 012345 0003\r"));
+}
+
+void MeterTest::qr32VanishMidTransfer() {
+    Meter meter(metersim::profile("zum410"));
+    QVERIFY(meter.start());
+    meter.setLogRecords(Meter::generateLog(meter.profile(), 10000));
+    meter.vanishAfterSending(3);
+    Port port(meter.portPath());
+    QCOMPARE(port.exchange("?S\r"), QByteArray("ZUM410 10000 \r"));
+    port.write("?R\r");
+    for (int i = 0; i < 3; ++i)
+        QCOMPARE(port.readLine().size(), 37);
+    QTRY_VERIFY_WITH_TIMEOUT(meter.hasVanished(), 1000);
+    QCOMPARE(port.readLine(200), QByteArray());
 }
 
 void MeterTest::powerOffSleepsUntilWakeUp() {

@@ -13,6 +13,13 @@
 
 namespace metersim {
 
+namespace {
+// While a vanish waits for the program to read what went before it.
+constexpr double kDrainPoll = 0.005;
+constexpr double kDrainQuiet = 0.02;
+constexpr double kDrainLimit = 2.0;
+} // namespace
+
 Meter::Meter(const Profile& p)
     : profile_(p), pty_(std::make_unique<Pty>()), responder_(std::make_unique<Responder>(p)),
       out_(std::make_unique<OutputQueue>()), startTime_(std::chrono::steady_clock::now()) {}
@@ -252,6 +259,7 @@ void Meter::run() {
         double wait = -1;
         {
             std::unique_lock lock(mutex_);
+            checkVanishMarker();
             if (vanishNow_ && !vanished_) {
                 out_->clear();
                 pty_->closeMaster();
@@ -262,9 +270,13 @@ void Meter::run() {
                 if (endless_ && out_->isEmpty())
                     out_->push(responder_->nextPrintedLine(), now());
                 fds[1] = {pty_->master(), POLLIN, 0};
-                wait = out_->waitTime(now());
-                if (wait == 0)
-                    fds[1].events |= POLLOUT;
+                if (drainSince_ >= 0) {
+                    wait = kDrainPoll;
+                } else {
+                    wait = out_->waitTime(now());
+                    if (wait == 0)
+                        fds[1].events |= POLLOUT;
+                }
             }
         }
         timespec ts{};
@@ -287,11 +299,32 @@ void Meter::run() {
         if (fds[1].revents & POLLIN)
             readInput();
         std::lock_guard lock(mutex_);
-        if (vanished_)
-            continue;
-        const OutputQueue::Step step = out_->writeTo(pty_->master(), now());
-        if (step == OutputQueue::Step::Vanish)
-            vanishNow_ = true;
+        if (!vanished_ && drainSince_ < 0)
+            out_->writeTo(pty_->master(), now());
+    }
+}
+
+void Meter::checkVanishMarker() {
+    // Closing the master discards what the program has not read yet, so a vanish in the middle
+    // of a transfer waits (briefly) until the records before it have been taken. The kernel
+    // hands written bytes to the slave asynchronously: only a queue found empty for a while
+    // means the program has them.
+    if (vanished_ || !out_->vanishDue(now())) {
+        drainSince_ = -1;
+        emptySince_ = -1;
+        return;
+    }
+    const double t = now();
+    if (drainSince_ < 0)
+        drainSince_ = t;
+    if (pty_->unreadBySlave() > 0)
+        emptySince_ = -1;
+    else if (emptySince_ < 0)
+        emptySince_ = t;
+    if ((emptySince_ >= 0 && t - emptySince_ >= kDrainQuiet) || t - drainSince_ > kDrainLimit) {
+        vanishNow_ = true;
+        drainSince_ = -1;
+        emptySince_ = -1;
     }
 }
 

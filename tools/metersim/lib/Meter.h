@@ -108,6 +108,7 @@ private:
     void wake();
     void run();
     void readInput();
+    void checkVanishMarker();
     int countLocked(const QByteArray& pattern) const;
 
     const Profile profile_;
@@ -128,6 +129,8 @@ private:
     bool endless_ = false;
     bool vanishNow_ = false;
     bool vanished_ = false;
+    double drainSince_ = -1; // when a due vanish marker started waiting for the program to read
+    double emptySince_ = -1; // since when the program has had nothing left to read
 };
 
 } // namespace metersim

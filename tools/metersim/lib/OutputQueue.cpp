@@ -29,6 +29,10 @@ double OutputQueue::waitTime(double now) const {
     return std::max(0.0, due - now);
 }
 
+bool OutputQueue::vanishDue(double now) const {
+    return !chunks_.empty() && chunks_.front().vanish && chunks_.front().notBefore <= now;
+}
+
 OutputQueue::Step OutputQueue::writeTo(int fd, double now) {
     bool wrote = false;
     while (!chunks_.empty()) {

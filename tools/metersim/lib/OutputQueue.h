@@ -27,6 +27,8 @@ public:
 
     // Seconds until the next byte may go out: 0 when one is due now, negative when none waits.
     double waitTime(double now) const;
+    // The vanish marker is at the front and due.
+    bool vanishDue(double now) const;
     // Writes whatever is due now to the non-blocking descriptor fd.
     Step writeTo(int fd, double now);
 

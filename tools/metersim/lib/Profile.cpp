@@ -42,8 +42,9 @@ Profile k5Profile(const QString& name, const QByteArray& model, const QByteArray
     return p;
 }
 
+// Logged count with at least four digits.
 QByteArray count4(int n) {
-    return QByteArray::number(qBound(0, n, 9999)).rightJustified(4, '0');
+    return QByteArray::number(qMax(0, n)).rightJustified(4, '0');
 }
 
 } // namespace

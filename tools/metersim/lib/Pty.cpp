@@ -4,6 +4,7 @@
 #include <cstdlib>
 #include <cstring>
 #include <fcntl.h>
+#include <sys/ioctl.h>
 #include <termios.h>
 #include <unistd.h>
 
@@ -59,6 +60,13 @@ bool Pty::open(QString* error) {
         return false;
     }
     return true;
+}
+
+int Pty::unreadBySlave() const {
+    int n = 0;
+    if (slave_ < 0 || ::ioctl(slave_, FIONREAD, &n) != 0)
+        return 0;
+    return n;
 }
 
 void Pty::closeMaster() {

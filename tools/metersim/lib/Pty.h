@@ -18,6 +18,8 @@ public:
     int master() const { return master_; }
     QString slavePath() const { return slavePath_; }
     bool isOpen() const { return master_ >= 0; }
+    // Bytes written to the master that the slave side has not read yet.
+    int unreadBySlave() const;
     // The device disappears: the master goes, which hangs the slave up for every holder.
     void closeMaster();
     void close();

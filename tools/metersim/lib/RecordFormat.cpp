@@ -2,7 +2,6 @@
 
 #include <QDateTime>
 
-
 namespace metersim {
 
 namespace {
@@ -26,8 +25,13 @@ QByteArray latin(const QString& s) {
     return s.toLatin1();
 }
 
+// The low digits of value in a field of fixed width: record numbers wrap as on the meter's
+// display, so a 10,000-record log keeps every column in place.
 QByteArray number(int value, int width) {
-    return QByteArray::number(value).rightJustified(width, '0', true);
+    int modulus = 1;
+    for (int i = 0; i < width; ++i)
+        modulus *= 10;
+    return QByteArray::number(value % modulus).rightJustified(width, '0');
 }
 
 QByteArray ph(int index) {
@@ -75,7 +79,7 @@ QByteArray RecordFormat::record(const Profile& p, int index) {
     case LogLayout::K5:
         return num + ' ' + cond + " 25.0C " + latin(t.toString("dd/MM hh:mm")) + '\r';
     case LogLayout::Qr32: {
-        QByteArray reading = ' ' + number((index + 1) % 1000, 3) + ' ' + cond + " 25.0";
+        QByteArray reading = ' ' + number(index + 1, 3) + ' ' + cond + " 25.0";
         reading = reading.leftJustified(19, ' ', true);
         return latin(t.toString("dd/MM/yy hh.mm.ss")) + reading + '\r';
     }

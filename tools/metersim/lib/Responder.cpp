@@ -42,13 +42,13 @@ QByteArray Responder::nextPrintedLine() {
 void Responder::onByte(char c, double now, OutputQueue& out) {
     if (c == '\n') {
         // A line feed acknowledges a block line; otherwise it is the program draining the line.
-        if (transfer_ == Transfer::Block && line_.isEmpty())
+        if (transfer_ == Transfer::Block && line_.isEmpty() && !silent_)
             sendNextItem(now, out);
         return;
     }
     if (line_.isEmpty()) {
         if (c == 'A') {
-            if (transfer_ == Transfer::Log)
+            if (transfer_ == Transfer::Log && !silent_)
                 sendNextItem(now, out);
             return;
         }
