@@ -1,0 +1,85 @@
+#pragma once
+
+// Small recorders for the help tests: a dialog seam that prints to a PDF file and remembers what
+// it was asked to open, and a message seam that keeps every text it showed.
+
+#include "shell/PlatformDialogs.h"
+#include "shell/Prompts.h"
+
+#include <QList>
+#include <QPrinter>
+#include <QProcess>
+#include <QRegularExpression>
+#include <QStringList>
+#include <QUrl>
+
+class RecordingDialogs : public PlatformDialogs {
+public:
+    QString pdfPath;          // where askPrinter sends the output
+    bool cancelPrint = false; // answer the print dialog with Cancel
+    int printerRequests = 0;
+    QList<QUrl> opened;
+
+    std::optional<SaveChoice> askSaveFile(QWidget*, const QString&, const QString&,
+                                          const QStringList&) override {
+        return std::nullopt;
+    }
+    std::optional<QString> askOpenFile(QWidget*, const QString&, const QStringList&) override {
+        return std::nullopt;
+    }
+    bool askPrinter(QWidget*, QPrinter& printer) override {
+        ++printerRequests;
+        if (cancelPrint)
+            return false;
+        printer.setOutputFormat(QPrinter::PdfFormat);
+        printer.setOutputFileName(pdfPath);
+        return true;
+    }
+    bool openWithDefaultApplication(const QUrl& url) override {
+        opened.append(url);
+        return true;
+    }
+};
+
+class RecordingPrompts : public Prompts {
+public:
+    QStringList texts;
+    QList<Icon> icons;
+    Answer answer = Answer::Ok;
+
+    Answer show(const QString& text, Icon icon, Buttons, bool) override {
+        texts.append(text);
+        icons.append(icon);
+        return answer;
+    }
+};
+
+// The text of a printed PDF, page by page, with the page number that closes each page removed and
+// all white space collapsed (the layout of a printout is not the point).
+inline QString printedText(const QString& pdf) {
+    QProcess run;
+    run.start(QStringLiteral("pdftotext"), {QStringLiteral("-layout"), pdf, QStringLiteral("-")});
+    if (!run.waitForFinished(20000) || run.exitCode() != 0)
+        return QStringLiteral("<pdftotext failed>");
+    const QStringList pages =
+        QString::fromUtf8(run.readAllStandardOutput()).split(QLatin1Char('\f'));
+    QStringList kept;
+    for (int i = 0; i < pages.size(); ++i) {
+        QStringList lines = pages.at(i).split(QLatin1Char('\n'));
+        while (!lines.isEmpty() && lines.constLast().trimmed().isEmpty())
+            lines.removeLast();
+        if (!lines.isEmpty() && lines.constLast().trimmed() == QString::number(i + 1))
+            lines.removeLast();
+        kept.append(lines.join(QLatin1Char('\n')));
+    }
+    return kept.join(QLatin1Char(' ')).simplified();
+}
+
+// The fonts a PDF uses, as pdffonts lists them.
+inline QString pdfFonts(const QString& pdf) {
+    QProcess run;
+    run.start(QStringLiteral("pdffonts"), {pdf});
+    if (!run.waitForFinished(20000))
+        return QString();
+    return QString::fromUtf8(run.readAllStandardOutput());
+}
