@@ -6,11 +6,14 @@
 #include "shell/PlatformDialogs.h"
 #include "shell/Prompts.h"
 
+#include <QApplication>
 #include <QList>
 #include <QPrinter>
 #include <QProcess>
 #include <QRegularExpression>
 #include <QStringList>
+#include <QTimer>
+#include <QWidget>
 #include <QUrl>
 
 class RecordingDialogs : public PlatformDialogs {
@@ -19,6 +22,7 @@ public:
     bool cancelPrint = false; // answer the print dialog with Cancel
     int printerRequests = 0;
     QList<QUrl> opened;
+    bool openSucceeds = true;
 
     std::optional<SaveChoice> askSaveFile(QWidget*, const QString&, const QString&,
                                           const QStringList&) override {
@@ -37,7 +41,7 @@ public:
     }
     bool openWithDefaultApplication(const QUrl& url) override {
         opened.append(url);
-        return true;
+        return openSucceeds;
     }
 };
 
@@ -52,6 +56,42 @@ public:
         icons.append(icon);
         return answer;
     }
+};
+
+// Runs `action` on the modal dialog that the code under test is about to show. A watchdog closes
+// a dialog still open after a few seconds and records it, so a fault cannot hang the suite. The
+// timers die with the driver, so nothing fires into a later test.
+class ModalDriver {
+public:
+    bool watchdogFired = false;
+    QString seen; // object name of the modal dialog the action found
+
+    template <typename Action> void whenShown(Action action) {
+        step_.setSingleShot(true);
+        step_.setInterval(0);
+        QObject::disconnect(&step_, nullptr, nullptr, nullptr);
+        QObject::connect(&step_, &QTimer::timeout, [this, action] {
+            QWidget* modal = QApplication::activeModalWidget();
+            seen = modal ? modal->objectName() : QString();
+            if (modal)
+                action(modal);
+        });
+        step_.start();
+        watchdog_.setSingleShot(true);
+        watchdog_.setInterval(5000);
+        QObject::disconnect(&watchdog_, nullptr, nullptr, nullptr);
+        QObject::connect(&watchdog_, &QTimer::timeout, [this] {
+            if (QWidget* modal = QApplication::activeModalWidget()) {
+                watchdogFired = true;
+                modal->close();
+            }
+        });
+        watchdog_.start();
+    }
+
+private:
+    QTimer step_;
+    QTimer watchdog_;
 };
 
 // The text of a printed PDF, page by page, with the page number that closes each page removed and
