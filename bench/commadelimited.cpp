@@ -1,0 +1,35 @@
+// The comma-delimited conversion at 1 MiB and 2 MiB. Target: 1 MiB in under 50 ms.
+#include "workspace/CommaDelimited.h"
+
+#include <QElapsedTimer>
+#include <algorithm>
+#include <cstdio>
+#include <vector>
+
+static QString makeText(qsizetype bytes) {
+    const QString line = QStringLiteral("01/02/2024 10:11:12     17  1.413 mS/cm  25.0 C\n");
+    QString text;
+    text.reserve(bytes + line.size());
+    while (text.size() < bytes)
+        text += line;
+    return text;
+}
+
+int main() {
+    for (qsizetype mib : {1, 2}) {
+        const QString text = makeText(mib * 1024 * 1024);
+        std::vector<double> ms;
+        QString out;
+        for (int run = 0; run < 15; ++run) {
+            QElapsedTimer t;
+            t.start();
+            out = CommaDelimited::convert(text);
+            ms.push_back(t.nsecsElapsed() / 1e6);
+        }
+        std::sort(ms.begin(), ms.end());
+        std::printf("comma-delimited: %lld MiB: median %.2f ms, worst %.2f ms (%s)\n",
+                    static_cast<long long>(mib), ms[ms.size() / 2], ms.back(),
+                    qPrintable(out.left(out.indexOf(QLatin1Char('\n')))));
+    }
+    return 0;
+}

@@ -1,0 +1,26 @@
+#pragma once
+
+#include <QString>
+#include <optional>
+
+// The unit and asterisk conversions applied to the whole workspace once a download ends.
+// Every edit replaces characters in place: the text never changes length, and converting text
+// that was already converted changes nothing more (converted units carry their new name).
+struct ReadingConversions {
+    bool msToUs = false;    // "mS" -> "uS", value times 1000
+    bool ppkToPpm = false;  // "ppK" -> "ppM", value times 1000
+    bool asterisks = false; // every "*" -> "." (runs last)
+
+    QString apply(const QString& text) const;
+
+    // The replacement for one value field (the characters before a unit): nullopt when the
+    // field is not a number, "+OVR" when the product is above 999999, otherwise the product
+    // rendered shortest, with "*" as the decimal mark when the field used one.
+    static std::optional<QString> convertValueField(QStringView field);
+    // Shortest decimal text of a single-precision value with at most seven significant
+    // digits, no exponent, no trailing zeros or trailing point.
+    static QString renderSingle(float value);
+
+private:
+    static void convertUnit(QString& s, const QString& unit, const QString& replacement);
+};

@@ -1,0 +1,62 @@
+#include "workspace/WorkspaceFileIO.h"
+
+#include "workspace/DelimitedFieldReader.h"
+#include "workspace/TextFileCodec.h"
+
+#include <QFile>
+#include <QSaveFile>
+
+bool WorkspaceFileIO::readForDisplay(const QString& path, QString& text, QString& error) {
+    QFile file(path);
+    if (!file.open(QIODevice::ReadOnly)) {
+        error = file.errorString();
+        return false;
+    }
+    QString decoded;
+    {
+        const QByteArray bytes = file.readAll();
+        if (file.error() != QFileDevice::NoError) {
+            error = file.errorString();
+            return false;
+        }
+        decoded = TextFileCodec::decode(bytes);
+    }
+    text = DelimitedFieldReader::toWorkspaceText(decoded);
+    return true;
+}
+
+bool WorkspaceFileIO::write(const QString& path, const QString& text, bool append, QString& error) {
+    const QByteArray bytes = TextFileCodec::encode(text);
+    if (append) {
+        QFile file(path);
+        if (!file.open(QIODevice::WriteOnly | QIODevice::Append)) {
+            error = file.errorString();
+            return false;
+        }
+        if (file.write(bytes) != bytes.size() || !file.flush()) {
+            error = file.errorString();
+            return false;
+        }
+        file.close();
+        if (file.error() != QFileDevice::NoError) {
+            error = file.errorString();
+            return false;
+        }
+        return true;
+    }
+    QSaveFile file(path);
+    if (!file.open(QIODevice::WriteOnly)) {
+        error = file.errorString();
+        return false;
+    }
+    if (file.write(bytes) != bytes.size()) {
+        error = file.errorString();
+        file.cancelWriting();
+        return false;
+    }
+    if (!file.commit()) {
+        error = file.errorString();
+        return false;
+    }
+    return true;
+}

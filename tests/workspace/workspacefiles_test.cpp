@@ -1,0 +1,218 @@
+#include "workspace/DelimitedFieldReader.h"
+#include "workspace/FindText.h"
+#include "workspace/SaveNames.h"
+#include "workspace/TextFileCodec.h"
+
+#include <QTest>
+
+class WorkspaceFilesTest : public QObject {
+    Q_OBJECT
+private slots:
+    void readsDelimitedFields_data();
+    void readsDelimitedFields();
+    void roundTripsEncoding_data();
+    void roundTripsEncoding();
+    void decodesBytes_data();
+    void decodesBytes();
+    void namesDefaultFile_data();
+    void namesDefaultFile();
+    void offersFilters();
+    void addsExtension_data();
+    void addsExtension();
+    void finds_data();
+    void finds();
+};
+
+void WorkspaceFilesTest::readsDelimitedFields_data() {
+    QTest::addColumn<QString>("file");
+    QTest::addColumn<QString>("expected");
+    QTest::newRow("comma starts new line") << "a,b\n"
+                                           << "a\nb\n";
+    QTest::newRow("leading blanks skipped") << "  lead\n\tx, y\n"
+                                            << "lead\nx\ny\n";
+    QTest::newRow("trailing blanks kept") << "trail  \n"
+                                          << "trail  \n";
+    QTest::newRow("quoted comma") << "\"q,uoted\",x\n"
+                                  << "q,uoted\nx\n";
+    QTest::newRow("quoted line break") << "\"multi\nline\"\n"
+                                       << "multi\nline\n";
+    QTest::newRow("quoted ends with line feed") << "\"ends\n\"\nz\n"
+                                                << "ends\nz\n";
+    QTest::newRow("after closing quote ignored") << "\"q\" junk,z"
+                                                 << "q\nz\n";
+    QTest::newRow("unclosed quote") << "\"unclosed, still\n"
+                                    << "unclosed, still\n";
+    QTest::newRow("comma before line end") << "a,\nb\n"
+                                           << "a\n\nb\n";
+    QTest::newRow("comma at end") << "a,"
+                                  << "a\n\n";
+    QTest::newRow("blank lines kept") << "\n\nb"
+                                      << "\n\nb\n";
+    QTest::newRow("CR LF") << "x\r\ny\r\n"
+                           << "x\ny\n";
+    QTest::newRow("CR only") << "x\ry"
+                             << "x\ny\n";
+    QTest::newRow("empty") << ""
+                           << "";
+    QTest::newRow("saved csv") << "Date Time,,\n01/02/2024 10:11:12,7.00,,25.0,\n"
+                               << "Date Time\n\n\n01/02/2024 10:11:12\n7.00\n\n25.0\n\n";
+    QTest::newRow("saved txt with header")
+        << "Date       Time      Reading\r\n01/02/2024 10:11:12   7.00 pH\n"
+        << "Date       Time      Reading\n01/02/2024 10:11:12   7.00 pH\n";
+}
+
+void WorkspaceFilesTest::readsDelimitedFields() {
+    QFETCH(QString, file);
+    QFETCH(QString, expected);
+    QCOMPARE(DelimitedFieldReader::toWorkspaceText(file), expected);
+}
+
+void WorkspaceFilesTest::roundTripsEncoding_data() {
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QByteArray>("bytes");
+    QTest::newRow("ascii") << "7.00 pH\n" << QByteArray("7.00 pH\n");
+    QTest::newRow("degree sign as one byte") << QString::fromUtf8("25.0\u00B0C\n")
+                                             << QByteArray("25.0\xB0"
+                                                           "C\n");
+    QTest::newRow("instrument control bytes")
+        << QString::fromLatin1("\x01\xFF\r\n") << QByteArray("\x01\xFF\r\n");
+    QTest::newRow("beyond Latin-1 as UTF-8")
+        << QString::fromUtf8("5 \u20AC, 25\u00B0\n") << QByteArray("5 \xE2\x82\xAC, 25\xC2\xB0\n");
+    QTest::newRow("empty") << QString() << QByteArray();
+}
+
+void WorkspaceFilesTest::roundTripsEncoding() {
+    QFETCH(QString, text);
+    QFETCH(QByteArray, bytes);
+    QCOMPARE(TextFileCodec::encode(text), bytes);
+    QCOMPARE(TextFileCodec::decode(bytes), text);
+}
+
+void WorkspaceFilesTest::decodesBytes_data() {
+    QTest::addColumn<QByteArray>("bytes");
+    QTest::addColumn<QString>("expected");
+    QTest::newRow("valid UTF-8") << QByteArray("\xC3\xA9t\xC3\xA9")
+                                 << QString::fromUtf8("\u00E9t\u00E9");
+    QTest::newRow("truncated UTF-8 at end")
+        << QByteArray("ab\xC3") << QString::fromLatin1("ab\xC3");
+    QTest::newRow("Latin-1 word") << QByteArray("caf\xE9 25\xB0")
+                                  << QString::fromLatin1("caf\xE9 25\xB0");
+}
+
+void WorkspaceFilesTest::decodesBytes() {
+    QFETCH(QByteArray, bytes);
+    QFETCH(QString, expected);
+    QCOMPARE(TextFileCodec::decode(bytes), expected);
+}
+
+void WorkspaceFilesTest::namesDefaultFile_data() {
+    QTest::addColumn<QString>("kind");
+    QTest::addColumn<QString>("expected");
+    QTest::newRow("glp") << "glp"
+                         << "GLP data";
+    QTest::newRow("log") << "log"
+                         << "Log data";
+    QTest::newRow("real time") << "realTime"
+                               << "Current data";
+    QTest::newRow("max min") << "maxMin"
+                             << "MaxMin data";
+    QTest::newRow("voltage") << "voltage"
+                             << "Voltage data";
+    QTest::newRow("listen") << "listen"
+                            << "Instrument data";
+    QTest::newRow("nothing") << ""
+                             << "Instrument data";
+    QTest::newRow("later wins") << "glp voltage log"
+                                << "Voltage data";
+}
+
+static DisplayKind kindFrom(const QString& words) {
+    DisplayKind k;
+    k.glp = words.contains(QLatin1String("glp"));
+    k.log = words.contains(QLatin1String("log"));
+    k.realTime = words.contains(QLatin1String("realTime"));
+    k.maxMin = words.contains(QLatin1String("maxMin"));
+    k.voltage = words.contains(QLatin1String("voltage"));
+    k.listen = words.contains(QLatin1String("listen"));
+    return k;
+}
+
+void WorkspaceFilesTest::namesDefaultFile() {
+    QFETCH(QString, kind);
+    QFETCH(QString, expected);
+    QCOMPARE(SaveNames::defaultName(kindFrom(kind)), expected);
+}
+
+void WorkspaceFilesTest::offersFilters() {
+    const QStringList both{"Text File   (*.txt)", "Comma Delimited    (*.csv)"};
+    const QStringList plain{"Text File   (*.txt)"};
+    for (const char* k : {"log", "realTime", "listen"})
+        QCOMPARE(SaveNames::saveFilters(kindFrom(QLatin1String(k))), both);
+    for (const char* k : {"glp", "maxMin", "voltage", ""})
+        QCOMPARE(SaveNames::saveFilters(kindFrom(QLatin1String(k))), plain);
+    QCOMPARE(SaveNames::openFilters(), QStringList{"All Files   (*.*)"});
+}
+
+void WorkspaceFilesTest::addsExtension_data() {
+    QTest::addColumn<QString>("path");
+    QTest::addColumn<int>("filter");
+    QTest::addColumn<QString>("expected");
+    QTest::newRow("txt") << "/data/Log data" << 0 << "/data/Log data.txt";
+    QTest::newRow("csv") << "/data/Log data" << 1 << "/data/Log data.csv";
+    QTest::newRow("own extension kept") << "/data/run.dat" << 1 << "/data/run.dat";
+    QTest::newRow("trailing dot kept") << "/data/run." << 0 << "/data/run.";
+    QTest::newRow("dot in folder") << "/data/v1.2/run" << 0 << "/data/v1.2/run";
+}
+
+void WorkspaceFilesTest::addsExtension() {
+    QFETCH(QString, path);
+    QFETCH(int, filter);
+    QFETCH(QString, expected);
+    QCOMPARE(SaveNames::withDefaultExtension(path, filter), expected);
+}
+
+void WorkspaceFilesTest::finds_data() {
+    QTest::addColumn<QString>("text");
+    QTest::addColumn<QString>("search");
+    QTest::addColumn<int>("findStart");
+    QTest::addColumn<int>("expected");
+    QTest::newRow("caret at start skips first") << "abcabc"
+                                                << "abc" << 2 << 4;
+    QTest::newRow("wrap to position 1") << "abcxyz"
+                                        << "abc" << 2 << 1;
+    QTest::newRow("wrap includes findStart") << "xabc"
+                                             << "abc" << 2 << 2;
+    QTest::newRow("wrap stops at findStart") << "xyabc"
+                                             << "ab" << 4 << 3;
+    QTest::newRow("case ignored") << "Cond MS/CM"
+                                  << "ms/cm" << 1 << 6;
+    QTest::newRow("Latin-1 case") << QString::fromLatin1("temp \xC9t\xE9")
+                                  << QString::fromLatin1("\xE9T\xC9") << 1 << 6;
+    QTest::newRow("overlapping") << "aaaa"
+                                 << "aa" << 3 << 3;
+    QTest::newRow("next after last wraps") << "ab ab"
+                                           << "ab" << 5 << 1;
+    QTest::newRow("not found") << "abc"
+                               << "zz" << 2 << 0;
+    QTest::newRow("start 1 no wrap") << "abc"
+                                     << "zz" << 1 << 0;
+    QTest::newRow("start beyond end") << "abc"
+                                      << "b" << 10 << 2;
+    QTest::newRow("empty search") << "abc"
+                                  << "" << 1 << 0;
+    QTest::newRow("empty text") << ""
+                                << "a" << 1 << 0;
+    QTest::newRow("longer than text") << "ab"
+                                      << "abc" << 1 << 0;
+}
+
+void WorkspaceFilesTest::finds() {
+    QFETCH(QString, text);
+    QFETCH(QString, search);
+    QFETCH(int, findStart);
+    QFETCH(int, expected);
+    QCOMPARE(FindText::find(text, search, findStart), qsizetype(expected));
+}
+
+QTEST_APPLESS_MAIN(WorkspaceFilesTest)
+#include "workspacefiles_test.moc"
