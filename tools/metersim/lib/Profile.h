@@ -53,7 +53,19 @@ struct Profile {
     QByteArray positionsReply() const;
 };
 
-// Names accepted by profile().
+// Names accepted by profile(), with their status replies for a log of 42 records:
+//   plain          "CD200 V1.21 012345 0042"      four-digit-year records, GLP block
+//   k50            "K50 V2.10 023456 0042"        two-digit-year records, GLP block
+//   k50v3, lxt     "K50V3 V3.00 034567 0042", "LXT200 V1.05 045678 0042"
+//   k51            "K51 V1.00 056789"             no log, no GLP (readings still dated)
+//   k5ac, k5acmv   "K5AC 0042 +m", "K5ACMV 0042 +m"   K5 records ("dd/mm hh:mm" at the end)
+//   k5ad, k5gj     "K5AD 0042 +", "K5GJ 0042 +m"
+//   k5ah           "K5AH 0042 +m 51234"           serial before the CR, GLP block
+//   percent-log    "CP600 V2.01 067890 0042 +mv%g" columns Date Time Log# pH Cond
+//   percent-nolog  "CP500 V1.10 078901 v%n"       readings pH Cond, no log
+//   qr32, zum410   "QR32 0042 ", "ZUM410 0042 "   "?W" = "QR32 Ver2.1 A12345", "?R" records
+//   qr34           "QR34A V1.40 089012 0042"      GLP block and "?M" max/min block
+// Every reply ends with CR.
 QStringList profileNames();
 // The named profile; throws std::invalid_argument for an unknown name.
 Profile profile(const QString& name);
