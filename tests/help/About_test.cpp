@@ -46,7 +46,7 @@ private:
 
     AppState state_;
     RecordingPrompts prompts_;
-    RecordingDialogs dialogs_;
+    ScriptedDialogs dialogs_;
     std::unique_ptr<QTemporaryDir> tmp_;
 };
 
@@ -54,7 +54,7 @@ void AboutTest::init() {
     state_ = AppState();
     state_.catalogDrive = QStringLiteral("d:");
     prompts_ = RecordingPrompts();
-    dialogs_ = RecordingDialogs();
+    dialogs_ = ScriptedDialogs();
     tmp_ = std::make_unique<QTemporaryDir>();
     QVERIFY(tmp_->isValid());
 }
@@ -133,16 +133,16 @@ void AboutTest::emailAndWebOpenThroughSeam() {
     box.show();
     QTest::mouseClick(box.label("lblEmail"), Qt::LeftButton);
     QTest::mouseClick(box.label("lblWeb"), Qt::LeftButton);
-    QCOMPARE(dialogs_.opened.size(), 2);
-    QCOMPARE(dialogs_.opened.at(0).scheme(), QStringLiteral("mailto"));
-    QCOMPARE(dialogs_.opened.at(0).path(), box.label("lblEmail")->text());
-    QVERIFY(dialogs_.opened.at(1).scheme() == QStringLiteral("https"));
-    QVERIFY(dialogs_.opened.at(1).host().endsWith(box.label("lblWeb")->text().mid(4)));
+    QCOMPARE(dialogs_.openedWithDefault.size(), 2);
+    QCOMPARE(dialogs_.openedWithDefault.at(0).scheme(), QStringLiteral("mailto"));
+    QCOMPARE(dialogs_.openedWithDefault.at(0).path(), box.label("lblEmail")->text());
+    QVERIFY(dialogs_.openedWithDefault.at(1).scheme() == QStringLiteral("https"));
+    QVERIFY(dialogs_.openedWithDefault.at(1).host().endsWith(box.label("lblWeb")->text().mid(4)));
     QVERIFY(prompts_.texts.isEmpty());
 }
 
 void AboutTest::failedOpenIsReported() {
-    dialogs_.openSucceeds = false;
+    dialogs_.setOpenWithResult(false);
     AboutKvoDialog box(state_, prompts_, dialogs_, tmp_->path());
     QTest::mouseClick(box.label("lblWeb"), Qt::LeftButton);
     QCOMPARE(prompts_.texts.size(), 1);
@@ -162,7 +162,7 @@ void AboutTest::catalogueLabelOpensChooser() {
     QCOMPARE(driver.seen, QStringLiteral("frmCatalog"));
     QVERIFY(!driver.watchdogFired);
     QCOMPARE(state_.catalogDrive, cd);
-    QCOMPARE(dialogs_.opened, QList<QUrl>{QUrl::fromLocalFile(cd + "/kvo/index.html")});
+    QCOMPARE(dialogs_.openedWithDefault, QList<QUrl>{QUrl::fromLocalFile(cd + "/kvo/index.html")});
     // The label follows the drive now remembered.
     QCOMPARE(box.label("lblCatalogue")->text(), QDir::toNativeSeparators(cd + "/kvo/index.html"));
 }
@@ -255,7 +255,7 @@ void AboutTest::browseOpensPresentPageAtOnce() {
     Catalogue::browse(state_, prompts_, dialogs_, nullptr);
     QTest::qWait(10); // let the driver look for a dialog that must not be there
     QCOMPARE(driver.seen, QString());
-    QCOMPARE(dialogs_.opened,
+    QCOMPARE(dialogs_.openedWithDefault,
              QList<QUrl>{QUrl::fromLocalFile(state_.catalogDrive + "/kvo/index.html")});
 }
 
@@ -282,7 +282,7 @@ void AboutTest::browseAbsentRemembersDriveAndSaysNotFound() {
     QCOMPARE(prompts_.texts, QStringList{QStringLiteral("Catalogue  not  found.")});
     QCOMPARE(prompts_.icons.at(0), Prompts::Icon::Exclamation);
     QCOMPARE(state_.catalogDrive, empty); // kept although the page is missing
-    QVERIFY(dialogs_.opened.isEmpty());
+    QVERIFY(dialogs_.openedWithDefault.isEmpty());
 }
 
 void AboutTest::chooserOpensPageFoundOnChosenDrive() {
@@ -296,7 +296,7 @@ void AboutTest::chooserOpensPageFoundOnChosenDrive() {
     QVERIFY(!driver.watchdogFired);
     QVERIFY(prompts_.texts.isEmpty());
     QCOMPARE(state_.catalogDrive, cd);
-    QCOMPARE(dialogs_.opened, QList<QUrl>{QUrl::fromLocalFile(cd + "/kvo/index.html")});
+    QCOMPARE(dialogs_.openedWithDefault, QList<QUrl>{QUrl::fromLocalFile(cd + "/kvo/index.html")});
 }
 
 void AboutTest::chooserCancelChangesNothing() {
@@ -309,7 +309,7 @@ void AboutTest::chooserCancelChangesNothing() {
     QCOMPARE(driver.seen, QStringLiteral("frmCatalog"));
     QCOMPARE(state_.catalogDrive, QStringLiteral("d:"));
     QVERIFY(prompts_.texts.isEmpty());
-    QVERIFY(dialogs_.opened.isEmpty());
+    QVERIFY(dialogs_.openedWithDefault.isEmpty());
 }
 
 void AboutTest::shellMetacharactersRunNothing_data() {
@@ -337,13 +337,13 @@ void AboutTest::shellMetacharactersRunNothing() {
     QDir::setCurrent(before);
 
     if (present) {
-        QCOMPARE(dialogs_.opened.size(), 1);
-        const QUrl url = dialogs_.opened.at(0);
+        QCOMPARE(dialogs_.openedWithDefault.size(), 1);
+        const QUrl url = dialogs_.openedWithDefault.at(0);
         QVERIFY(url.isLocalFile());
         QCOMPARE(url.toLocalFile(), drive + "/kvo/index.html");
         QCOMPARE(driver.seen, QString());
     } else {
-        QVERIFY(dialogs_.opened.isEmpty());
+        QVERIFY(dialogs_.openedWithDefault.isEmpty());
         QCOMPARE(driver.seen, QStringLiteral("frmCatalog")); // closing it changed nothing
         QCOMPARE(state_.catalogDrive, drive);
     }

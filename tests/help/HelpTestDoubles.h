@@ -1,49 +1,18 @@
 #pragma once
 
-// Small recorders for the help tests: a dialog seam that prints to a PDF file and remembers what
-// it was asked to open, and a message seam that keeps every text it showed.
+// Helpers for the help tests: a message seam that keeps every text it showed, a driver for modal
+// dialogs, and readers for printed PDF files. File and print dialogs come from ScriptedDialogs.
 
-#include "shell/PlatformDialogs.h"
 #include "shell/Prompts.h"
+#include "support/ScriptedDialogs.h"
 
 #include <QApplication>
 #include <QList>
-#include <QPrinter>
 #include <QProcess>
 #include <QRegularExpression>
 #include <QStringList>
 #include <QTimer>
 #include <QWidget>
-#include <QUrl>
-
-class RecordingDialogs : public PlatformDialogs {
-public:
-    QString pdfPath;          // where askPrinter sends the output
-    bool cancelPrint = false; // answer the print dialog with Cancel
-    int printerRequests = 0;
-    QList<QUrl> opened;
-    bool openSucceeds = true;
-
-    std::optional<SaveChoice> askSaveFile(QWidget*, const QString&, const QString&,
-                                          const QStringList&) override {
-        return std::nullopt;
-    }
-    std::optional<QString> askOpenFile(QWidget*, const QString&, const QStringList&) override {
-        return std::nullopt;
-    }
-    bool askPrinter(QWidget*, QPrinter& printer) override {
-        ++printerRequests;
-        if (cancelPrint)
-            return false;
-        printer.setOutputFormat(QPrinter::PdfFormat);
-        printer.setOutputFileName(pdfPath);
-        return true;
-    }
-    bool openWithDefaultApplication(const QUrl& url) override {
-        opened.append(url);
-        return openSucceeds;
-    }
-};
 
 class RecordingPrompts : public Prompts {
 public:

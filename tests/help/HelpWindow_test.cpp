@@ -40,7 +40,8 @@ private:
 
     AppState state_;
     RecordingPrompts prompts_;
-    RecordingDialogs dialogs_;
+    ScriptedDialogs dialogs_;
+    QString pdf_;
     std::unique_ptr<QTemporaryDir> out_;
 };
 
@@ -51,10 +52,10 @@ static QString collapsed(const QString& text) {
 void HelpWindowTest::init() {
     state_ = AppState();
     prompts_ = RecordingPrompts();
-    dialogs_ = RecordingDialogs();
+    dialogs_ = ScriptedDialogs();
     out_ = std::make_unique<QTemporaryDir>();
     QVERIFY(out_->isValid());
-    dialogs_.pdfPath = out_->filePath("help.pdf");
+    pdf_ = out_->filePath("help.pdf");
 }
 
 std::unique_ptr<HelpWindow> HelpWindowTest::open(HelpKind kind, const QString& folder) {
@@ -139,7 +140,7 @@ void HelpWindowTest::keysMoveAndWrap() {
     for (int i = 0; i < HelpFile::topicCount(kind); ++i)
         QCOMPARE(w->arrow(i)->isVisible(), i == expected);
     QVERIFY(w->isVisible());
-    QCOMPARE(dialogs_.printerRequests, 0);
+    QCOMPARE(dialogs_.printDialogs, 0);
 }
 
 void HelpWindowTest::clickShowsTopicButKeepsKeyPosition() {
@@ -163,7 +164,7 @@ void HelpWindowTest::enterOnTopicDoesNothing() {
     QTest::keyClick(w->textArea(), Qt::Key_Return);
     QTest::keyClick(w.get(), Qt::Key_Enter, Qt::KeypadModifier);
     QVERIFY(w->isVisible());
-    QCOMPARE(dialogs_.printerRequests, 0);
+    QCOMPARE(dialogs_.printDialogs, 0);
     QCOMPARE(w->textArea()->toPlainText(), shown);
     // Enter must not have been typed into the text either.
     QCOMPARE(w->selectedTopic(), 1);
@@ -186,19 +187,19 @@ void HelpWindowTest::enterOnPrintPrintsWholeFile() {
     const QString shown = w->textArea()->toPlainText();
     const QStringList topics = state_.helpTopics;
 
+    dialogs_.printToPdf(pdf_);
     QTest::keyClick(w->textArea(), Qt::Key_Return);
-    QCOMPARE(dialogs_.printerRequests, 1);
-    QVERIFY(QFile::exists(dialogs_.pdfPath));
+    QCOMPARE(dialogs_.printDialogs, 1);
+    QVERIFY(QFile::exists(pdf_));
     QVERIFY2(prompts_.texts.isEmpty(), qPrintable(prompts_.texts.join('|')));
 
-    const QString text = printedText(dialogs_.pdfPath);
+    const QString text = printedText(pdf_);
     QCOMPARE(text, collapsed(HelpFile::composePrintText(topics, printed)));
     QVERIFY(text.startsWith(collapsed(topics.at(0))));
     QVERIFY(text.contains(collapsed(topics.at(printed - 1))));
     QVERIFY(!text.contains(collapsed(topics.at(printed + 1)))); // the exit topic is left out
-    QVERIFY2(pdfFonts(dialogs_.pdfPath).contains("LiberationMono") ||
-                 pdfFonts(dialogs_.pdfPath).contains("Courier"),
-             qPrintable(pdfFonts(dialogs_.pdfPath)));
+    QVERIFY2(pdfFonts(pdf_).contains("LiberationMono") || pdfFonts(pdf_).contains("Courier"),
+             qPrintable(pdfFonts(pdf_)));
 
     // The window stays open on the same topic with the same topics.
     QVERIFY(w->isVisible());
@@ -219,19 +220,21 @@ void HelpWindowTest::enterOnExitCloses() {
     QTest::keyClick(w->textArea(), Qt::Key_Up);
     QTest::keyClick(w->textArea(), Qt::Key_Return);
     QVERIFY(!w->isVisible());
-    QCOMPARE(dialogs_.printerRequests, 0);
+    QCOMPARE(dialogs_.printDialogs, 0);
 }
 
 void HelpWindowTest::clicksOnPrintLabelAndPicturePrint() {
+    dialogs_.printToPdf(pdf_);
+    dialogs_.printToPdf(pdf_);
     auto w = open(HelpKind::Other);
     QTest::mouseClick(w->topicLabel(3), Qt::LeftButton);
     const QString shown = w->textArea()->toPlainText();
     QTest::mouseClick(w->topicLabel(6), Qt::LeftButton);
-    QCOMPARE(dialogs_.printerRequests, 1);
-    QVERIFY(QFile::remove(dialogs_.pdfPath));
+    QCOMPARE(dialogs_.printDialogs, 1);
+    QVERIFY(QFile::remove(pdf_));
     QTest::mouseClick(w->printPicture(), Qt::LeftButton);
-    QCOMPARE(dialogs_.printerRequests, 2);
-    QVERIFY(QFile::exists(dialogs_.pdfPath));
+    QCOMPARE(dialogs_.printDialogs, 2);
+    QVERIFY(QFile::exists(pdf_));
     QCOMPARE(w->shownTopic(), 3);
     QCOMPARE(w->textArea()->toPlainText(), shown);
     QCOMPARE(w->selectedTopic(), 0);
@@ -245,17 +248,17 @@ void HelpWindowTest::clickOnExitLabelCloses() {
 }
 
 void HelpWindowTest::printCancelledPrintsNothing() {
-    dialogs_.cancelPrint = true;
+    dialogs_.cancelPrint();
     auto w = open(HelpKind::General);
     QTest::mouseClick(w->printPicture(), Qt::LeftButton);
-    QCOMPARE(dialogs_.printerRequests, 1);
-    QVERIFY(!QFile::exists(dialogs_.pdfPath));
+    QCOMPARE(dialogs_.printDialogs, 1);
+    QVERIFY(!QFile::exists(pdf_));
     QVERIFY(prompts_.texts.isEmpty());
     QVERIFY(w->isVisible());
 }
 
 void HelpWindowTest::printFailureIsReported() {
-    dialogs_.pdfPath = out_->filePath("no/such/folder/help.pdf");
+    dialogs_.printToPdf(out_->filePath("no/such/folder/help.pdf"));
     auto w = open(HelpKind::General);
     QTest::mouseClick(w->printPicture(), Qt::LeftButton);
     QCOMPARE(prompts_.texts.size(), 1);
