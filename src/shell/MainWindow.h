@@ -97,5 +97,6 @@ private:
     std::unique_ptr<ReadingCommands> readings_;
     std::unique_ptr<WorkspaceCommands> workspace_;
     std::unique_ptr<HelpCommands> help_;
+    QString dataFolder_;
     bool exiting_ = false;
 };

@@ -11,3 +11,5 @@ void WorkspaceCommands::SaveWorkspace() {}
 void WorkspaceCommands::ApplyDataConversions() {
     w_.controls().RichTextBox1->setPlainText(w_.state().workspaceText);
 }
+
+void WorkspaceCommands::ShowFormatDialog() {}

@@ -14,6 +14,8 @@ public:
     void SaveWorkspace();
     // Converts workspaceText as the data-format settings say and shows it in the workspace.
     void ApplyDataConversions();
+    // The data-format dialog (also shown by the setup wizard).
+    void ShowFormatDialog();
 
 private:
     MainWindow& w_;

@@ -1,0 +1,52 @@
+#include "shell/QtPlatformDialogs.h"
+
+#include <QDesktopServices>
+#include <QDir>
+#include <QFileDialog>
+#include <QPrintDialog>
+#include <QPrinter>
+
+std::optional<PlatformDialogs::SaveChoice>
+QtPlatformDialogs::askSaveFile(QWidget* parent, const QString& folder, const QString& proposedName,
+                               const QStringList& filters) {
+    QFileDialog dialog(parent);
+    dialog.setAcceptMode(QFileDialog::AcceptSave);
+    dialog.setFileMode(QFileDialog::AnyFile);
+    // The file-exists question is the program's own dialog.
+    dialog.setOption(QFileDialog::DontConfirmOverwrite);
+    dialog.setOption(QFileDialog::DontResolveSymlinks);
+    dialog.setDirectory(folder);
+    dialog.setNameFilters(filters);
+    dialog.selectFile(proposedName);
+    if (dialog.exec() != QDialog::Accepted || dialog.selectedFiles().isEmpty())
+        return std::nullopt;
+    SaveChoice choice;
+    choice.path = dialog.selectedFiles().constFirst();
+    choice.filterIndex = qMax(0, int(filters.indexOf(dialog.selectedNameFilter())));
+    return choice;
+}
+
+std::optional<QString> QtPlatformDialogs::askOpenFile(QWidget* parent, const QString& folder,
+                                                      const QStringList& filters) {
+    QFileDialog dialog(parent);
+    dialog.setAcceptMode(QFileDialog::AcceptOpen);
+    dialog.setFileMode(QFileDialog::AnyFile); // a missing name gets the program's own message
+    dialog.setOptions(QFileDialog::ReadOnly | QFileDialog::DontResolveSymlinks);
+    dialog.setDirectory(folder);
+    dialog.setNameFilters(filters);
+    if (dialog.exec() != QDialog::Accepted || dialog.selectedFiles().isEmpty())
+        return std::nullopt;
+    return dialog.selectedFiles().constFirst();
+}
+
+bool QtPlatformDialogs::askPrinter(QWidget* parent, QPrinter& printer) {
+    QPrintDialog dialog(&printer, parent);
+    dialog.setOption(QAbstractPrintDialog::PrintToFile, false);
+    dialog.setOption(QAbstractPrintDialog::PrintSelection, false);
+    dialog.setOption(QAbstractPrintDialog::PrintPageRange, false);
+    return dialog.exec() == QDialog::Accepted;
+}
+
+bool QtPlatformDialogs::openWithDefaultApplication(const QUrl& url) {
+    return QDesktopServices::openUrl(url);
+}

@@ -1,0 +1,16 @@
+#pragma once
+
+#include "shell/PlatformDialogs.h"
+
+// The platform's own dialogs through Qt, and QDesktopServices for default applications
+// (never a shell command line, so no text handed over can run a command).
+class QtPlatformDialogs : public PlatformDialogs {
+public:
+    std::optional<SaveChoice> askSaveFile(QWidget* parent, const QString& folder,
+                                          const QString& proposedName,
+                                          const QStringList& filters) override;
+    std::optional<QString> askOpenFile(QWidget* parent, const QString& folder,
+                                       const QStringList& filters) override;
+    bool askPrinter(QWidget* parent, QPrinter& printer) override;
+    bool openWithDefaultApplication(const QUrl& url) override;
+};

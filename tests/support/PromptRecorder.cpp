@@ -1,0 +1,23 @@
+#include "PromptRecorder.h"
+
+Prompts::Answer PromptRecorder::show(const QString& text, Icon icon, Buttons buttons, bool systemModal) {
+    const Shown s{text, icon, buttons, systemModal};
+    shown.append(s);
+    if (onShow)
+        onShow(s);
+    if (!script_.isEmpty())
+        return script_.dequeue();
+    switch (buttons) {
+    case Buttons::YesNo: return Answer::No;
+    case Buttons::RetryCancel: return Answer::Cancel;
+    case Buttons::Ok: break;
+    }
+    return Answer::Ok;
+}
+
+QStringList PromptRecorder::texts() const {
+    QStringList list;
+    for (const Shown& s : shown)
+        list << s.text;
+    return list;
+}
