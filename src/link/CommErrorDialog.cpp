@@ -33,8 +33,17 @@ CommErrorDialog::CommErrorDialog(QWidget* parent) : QDialog(parent) {
     for (QPushButton* b : {setup, retry, cancel})
         buttons->addWidget(b);
     layout->addLayout(buttons);
-    connect(setup, &QPushButton::clicked, this, [this] { choice_ = Choice::Setup; accept(); });
-    connect(retry, &QPushButton::clicked, this, [this] { choice_ = Choice::Retry; accept(); });
+    connect(setup, &QPushButton::clicked, this, [this] {
+        choice_ = Choice::Setup;
+        accept();
+    });
+    connect(retry, &QPushButton::clicked, this, [this] {
+        choice_ = Choice::Retry;
+        accept();
+    });
     // Escape rejects the dialog, which keeps the Cancel choice.
-    connect(cancel, &QPushButton::clicked, this, [this] { choice_ = Choice::Cancel; reject(); });
+    connect(cancel, &QPushButton::clicked, this, [this] {
+        choice_ = Choice::Cancel;
+        reject();
+    });
 }

@@ -81,14 +81,16 @@ void CommsPortDialog::cmdOK_Click() {
     bool ok = false;
     const qlonglong baud = cboBaud_->currentText().trimmed().toLongLong(&ok);
     if (!ok || baud <= 0 || baud > std::numeric_limits<qint32>::max()) {
-        prompts_.show(QStringLiteral("The  baud  rate  must  be  a  whole  number,  for  example  9600."),
-                      Prompts::Icon::Exclamation, Prompts::Buttons::Ok);
+        prompts_.show(
+            QStringLiteral("The  baud  rate  must  be  a  whole  number,  for  example  9600."),
+            Prompts::Icon::Exclamation, Prompts::Buttons::Ok);
         cboBaud_->setFocus();
         return;
     }
     if (!PortNames::isUsableName(port)) {
-        prompts_.show(QStringLiteral("Please  enter  a  serial  port  name  such  as  COM1  or  ttyUSB0."),
-                      Prompts::Icon::Exclamation, Prompts::Buttons::Ok);
+        prompts_.show(
+            QStringLiteral("Please  enter  a  serial  port  name  such  as  COM1  or  ttyUSB0."),
+            Prompts::Icon::Exclamation, Prompts::Buttons::Ok);
         cboCom_->setFocus();
         return;
     }

@@ -31,8 +31,9 @@ void Connection::ConnectMeter() {
     } catch (const std::exception&) {
     }
     c.mnuDetectMeter->setEnabled(false);
-    w_.setMessage(QStringLiteral("Searching  for  meter  on  ") + s_.portName + QStringLiteral("  at  ") +
-                  QString::number(s_.baudRate) + QStringLiteral("  baud ..."));
+    w_.setMessage(QStringLiteral("Searching  for  meter  on  ") + s_.portName +
+                  QStringLiteral("  at  ") + QString::number(s_.baudRate) +
+                  QStringLiteral("  baud ..."));
     const bool exists = PortProbe::comPortExists(s_.portName);
     const QString mode = QStringLiteral("baud=") + QString::number(s_.baudRate) +
                          QStringLiteral(" parity=N data=8 stop=1");
@@ -43,7 +44,8 @@ void Connection::ConnectMeter() {
     }
     if (s_.ioResult != 0) {
         w_.setMessage(QString());
-        const auto kind = exists ? PortErrorDialog::Kind::InUse : PortErrorDialog::Kind::Unavailable;
+        const auto kind =
+            exists ? PortErrorDialog::Kind::InUse : PortErrorDialog::Kind::Unavailable;
         PortErrorDialog::Choice choice = PortErrorDialog::Choice::Cancel;
         {
             PortErrorDialog dialog(kind, s_.portName, &w_);

@@ -28,7 +28,9 @@ bool containsWord(const QString& text, const char* word) {
 
 Exchange::Exchange(MainWindow& window) : w_(window), s_(window.state()) {}
 
-QString Exchange::wakeUpCommand() { return QStringLiteral("{@").repeated(24) + QStringLiteral("?S\r"); }
+QString Exchange::wakeUpCommand() {
+    return QStringLiteral("{@").repeated(24) + QStringLiteral("?S\r");
+}
 
 bool Exchange::isBusyReply(const QString& reply) {
     return reply.isEmpty() || containsWord(reply, "BUSY") || containsWord(reply, "OK\r");
@@ -140,14 +142,15 @@ void Exchange::SendCommand() {
     if (!s_.commandText.contains(QLatin1String("?S")) && containsWord(s_.responseText, "ERROR")) {
         w_.setMessage(QString());
         c.ProgressBar1->hide();
-        w_.prompts().show(QStringLiteral(" This function is not available with your firmware version."),
-                          Prompts::Icon::Critical, Prompts::Buttons::Ok);
+        w_.prompts().show(
+            QStringLiteral(" This function is not available with your firmware version."),
+            Prompts::Icon::Critical, Prompts::Buttons::Ok);
     }
     if (containsWord(s_.responseText, "EXIT")) {
         w_.setMessage(QString());
         c.ProgressBar1->hide();
-        w_.prompts().show(QStringLiteral("User has terminated this process."), Prompts::Icon::Critical,
-                          Prompts::Buttons::Ok);
+        w_.prompts().show(QStringLiteral("User has terminated this process."),
+                          Prompts::Icon::Critical, Prompts::Buttons::Ok);
     }
     if (containsWord(s_.responseText, "OK\r"))
         s_.responseText = kBusyReply;
@@ -155,8 +158,9 @@ void Exchange::SendCommand() {
 
 void Exchange::ShowBusyMessage() {
     const auto answer = w_.prompts().show(
-        QStringLiteral("Instrument  is  busy  with  other  processes.\r\n\r\nPlease  ensure  meter  is  "
-                       "operating  in  normal  display  mode  before  selecting  'Retry'."),
+        QStringLiteral(
+            "Instrument  is  busy  with  other  processes.\r\n\r\nPlease  ensure  meter  is  "
+            "operating  in  normal  display  mode  before  selecting  'Retry'."),
         Prompts::Icon::Exclamation, Prompts::Buttons::RetryCancel);
     FlushInput();
     if (answer == Prompts::Answer::Retry) {
@@ -170,8 +174,9 @@ void Exchange::ShowBusyMessage() {
 }
 
 void Exchange::ShowNoResponseMessage() {
-    const auto answer = w_.prompts().show(QStringLiteral("No response from meter !"),
-                                          Prompts::Icon::Exclamation, Prompts::Buttons::RetryCancel);
+    const auto answer =
+        w_.prompts().show(QStringLiteral("No response from meter !"), Prompts::Icon::Exclamation,
+                          Prompts::Buttons::RetryCancel);
     if (answer == Prompts::Answer::Retry) {
         FlushInput();
         SerialWrite(s_.commandText);

@@ -45,7 +45,16 @@ PortErrorDialog::PortErrorDialog(Kind kind, const QString& portName, QWidget* pa
     for (QPushButton* b : {retry, setup, cancel})
         buttons->addWidget(b);
     layout->addLayout(buttons);
-    connect(retry, &QPushButton::clicked, this, [this] { choice_ = Choice::Retry; accept(); });
-    connect(setup, &QPushButton::clicked, this, [this] { choice_ = Choice::Setup; accept(); });
-    connect(cancel, &QPushButton::clicked, this, [this] { choice_ = Choice::Cancel; reject(); });
+    connect(retry, &QPushButton::clicked, this, [this] {
+        choice_ = Choice::Retry;
+        accept();
+    });
+    connect(setup, &QPushButton::clicked, this, [this] {
+        choice_ = Choice::Setup;
+        accept();
+    });
+    connect(cancel, &QPushButton::clicked, this, [this] {
+        choice_ = Choice::Cancel;
+        reject();
+    });
 }

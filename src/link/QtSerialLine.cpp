@@ -11,7 +11,9 @@ QtSerialLine::QtSerialLine(QObject* parent) : SerialLine(parent) {
     });
 }
 
-QtSerialLine::~QtSerialLine() { port_.close(); }
+QtSerialLine::~QtSerialLine() {
+    port_.close();
+}
 
 qint32 QtSerialLine::open(const QString& devicePath, const QString& mode) {
     port_.close();
@@ -32,11 +34,12 @@ qint32 QtSerialLine::open(const QString& devicePath, const QString& mode) {
                         : m.parity == 'S' ? QSerialPort::SpaceParity
                                           : QSerialPort::NoParity;
     // A port that cannot take a setting is a failed open, not a silent one.
-    const bool ok = port_.setBaudRate(m.baud) &&
-                    port_.setDataBits(static_cast<QSerialPort::DataBits>(m.dataBits)) &&
-                    port_.setParity(parity) &&
-                    port_.setStopBits(m.stopBits == 2 ? QSerialPort::TwoStop : QSerialPort::OneStop) &&
-                    port_.setFlowControl(QSerialPort::NoFlowControl);
+    const bool ok =
+        port_.setBaudRate(m.baud) &&
+        port_.setDataBits(static_cast<QSerialPort::DataBits>(m.dataBits)) &&
+        port_.setParity(parity) &&
+        port_.setStopBits(m.stopBits == 2 ? QSerialPort::TwoStop : QSerialPort::OneStop) &&
+        port_.setFlowControl(QSerialPort::NoFlowControl);
     if (!ok) {
         lastOpenError_ = port_.error();
         port_.close();
@@ -80,7 +83,8 @@ qint32 QtSerialLine::write(const QByteArray& bytes) {
         checkPortError("write");
     // No event loop runs during an exchange: push the bytes out now. The limit allows for the
     // slowest line speed.
-    const int limitMs = 1000 + static_cast<int>(qint64(bytes.size()) * 10 * 1000 / qMax(baud_, 300));
+    const int limitMs =
+        1000 + static_cast<int>(qint64(bytes.size()) * 10 * 1000 / qMax(baud_, 300));
     while (port_.bytesToWrite() > 0) {
         if (!port_.waitForBytesWritten(limitMs)) {
             checkPortError("write");
@@ -133,4 +137,6 @@ bool QtSerialLine::waitForByte(int msecs) {
     return port_.bytesAvailable() > 0;
 }
 
-bool QtSerialLine::isOpen() const { return port_.isOpen(); }
+bool QtSerialLine::isOpen() const {
+    return port_.isOpen();
+}

@@ -8,6 +8,6 @@
 class Clock {
 public:
     virtual ~Clock() = default;
-    virtual double nowSeconds() const = 0;  // monotonic, arbitrary zero
-    virtual QDateTime wallNow() const = 0;  // local date and time
+    virtual double nowSeconds() const = 0; // monotonic, arbitrary zero
+    virtual QDateTime wallNow() const = 0; // local date and time
 };

@@ -52,7 +52,8 @@ MainWindow::~MainWindow() {
 }
 
 void MainWindow::start() {
-    setWindowTitle(QStringLiteral("  Telvio  v%1.%2").arg(telvio::kVersionMajor).arg(telvio::kVersionMinor));
+    setWindowTitle(
+        QStringLiteral("  Telvio  v%1.%2").arg(telvio::kVersionMajor).arg(telvio::kVersionMinor));
     placeWindow();
     show();
     state_.numLogged = 0;
@@ -79,16 +80,22 @@ void MainWindow::placeWindow() {
     move(area.left() + margin, area.top() + margin);
 }
 
-QString MainWindow::dataFolder() const { return dataFolder_; }
+QString MainWindow::dataFolder() const {
+    return dataFolder_;
+}
 
 void MainWindow::setMessage(const QString& text) {
     c_.lblMessage->setText(text);
     c_.lblMessage->repaint();
 }
 
-void MainWindow::setLeftTwips(QWidget* w, int twips) { w->move(twipsToPixels(twips), w->y()); }
+void MainWindow::setLeftTwips(QWidget* w, int twips) {
+    w->move(twipsToPixels(twips), w->y());
+}
 
-void MainWindow::setTopTwips(QWidget* w, int twips) { w->move(w->x(), twipsToPixels(twips)); }
+void MainWindow::setTopTwips(QWidget* w, int twips) {
+    w->move(w->x(), twipsToPixels(twips));
+}
 
 void MainWindow::closeEvent(QCloseEvent* event) {
     if (exiting_) {
@@ -164,8 +171,9 @@ void MainWindow::PromptSaveAndClear(const QString& mode) {
     // Listened and real-time data cannot be fetched again: a "Yes" whose save was cancelled or
     // failed asks again rather than emptying the workspace.
     for (;;) {
-        const auto answer = prompts().show(QStringLiteral("Data will be lost!  Would you like to save now?"),
-                                           Prompts::Icon::Exclamation, Prompts::Buttons::YesNo);
+        const auto answer =
+            prompts().show(QStringLiteral("Data will be lost!  Would you like to save now?"),
+                           Prompts::Icon::Exclamation, Prompts::Buttons::YesNo);
         if (answer != Prompts::Answer::Yes) {
             c_.lblHeader->clear();
             break;
@@ -179,20 +187,22 @@ void MainWindow::PromptSaveAndClear(const QString& mode) {
 }
 
 void MainWindow::UncheckDisplayMenus() {
-    for (QAction* a : {c_.mnuGLP, c_.mnuLog, c_.mnuRealTime, c_.mnuMaxMin, c_.mnuVoltage, c_.mnuListen})
+    for (QAction* a :
+         {c_.mnuGLP, c_.mnuLog, c_.mnuRealTime, c_.mnuMaxMin, c_.mnuVoltage, c_.mnuListen})
         a->setChecked(false);
 }
 
 void MainWindow::DisableCommandsForRun() {
-    for (QPushButton* b : {c_.cmdSaveFile, c_.cmdEraseLog, c_.cmdEnableLogging, c_.cmdK5On, c_.cmdK5Off,
-                           c_.cmdOpenFile, c_.cmdListen, c_.cmdLoggedData, c_.cmdHelp, c_.cmdPrint,
-                           c_.cmdGLPData, c_.cmdCurrentData})
+    for (QPushButton* b : {c_.cmdSaveFile, c_.cmdEraseLog, c_.cmdEnableLogging, c_.cmdK5On,
+                           c_.cmdK5Off, c_.cmdOpenFile, c_.cmdListen, c_.cmdLoggedData, c_.cmdHelp,
+                           c_.cmdPrint, c_.cmdGLPData, c_.cmdCurrentData})
         b->setEnabled(false);
     c_.cmdStopCurrentData->show();
     c_.cmdStopCurrentData->setEnabled(true);
     c_.cmdStopCurrentData->raise();
     c_.cmdStopCurrentData->setFocus();
-    for (QPushButton* b : {c_.cmdStopStirring, c_.cmdStartStirring, c_.cmdDisableLogging, c_.cmdMaxMin})
+    for (QPushButton* b :
+         {c_.cmdStopStirring, c_.cmdStartStirring, c_.cmdDisableLogging, c_.cmdMaxMin})
         b->setEnabled(false);
     for (QMenu* m : {c_.mnuFile, c_.mnuEdit, c_.mnuDisplay, c_.mnuSetup, c_.mnuHelp})
         m->setEnabled(false);

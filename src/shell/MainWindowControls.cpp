@@ -18,7 +18,8 @@ constexpr int kButtonHeight = 900; // twips
 constexpr int kRowOneTop = 60;
 constexpr int kRowTwoTop = 1080;
 
-QAction* addItem(QMenu* menu, const char* name, const char* caption, const char* shortcut = nullptr) {
+QAction* addItem(QMenu* menu, const char* name, const char* caption,
+                 const char* shortcut = nullptr) {
     auto* action = menu->addAction(QString::fromLatin1(caption));
     action->setObjectName(QString::fromLatin1(name));
     if (shortcut)
@@ -100,7 +101,8 @@ void MainWindow::buildMenus() {
     c_.mnuVoltage = addItem(c_.mnuDisplay, "mnuVoltage", "&Voltage", "Ctrl+V");
     c_.mnuMaxMin = addItem(c_.mnuDisplay, "mnuMaxMin", "&Max / Min", "Ctrl+M");
     c_.mnuListen = addItem(c_.mnuDisplay, "mnuListen", "Li&sten");
-    for (QAction* a : {c_.mnuRealTime, c_.mnuLog, c_.mnuGLP, c_.mnuVoltage, c_.mnuMaxMin, c_.mnuListen})
+    for (QAction* a :
+         {c_.mnuRealTime, c_.mnuLog, c_.mnuGLP, c_.mnuVoltage, c_.mnuMaxMin, c_.mnuListen})
         a->setCheckable(true);
     c_.mnuVoltage->setVisible(false);
     c_.mnuMaxMin->setVisible(false);
@@ -134,8 +136,10 @@ void MainWindow::buildButtons() {
             button->setToolTip(QString::fromLatin1(tip));
     };
     make(c_.cmdOpenFile, "cmdOpenFile", "Open", 30, kRowOneTop, "Open file for display");
-    make(c_.cmdSaveFile, "cmdSaveFile", "Save", 870, kRowOneTop, "Save information displayed in workspace");
-    make(c_.cmdPrint, "cmdPrint", "Print", 1710, kRowOneTop, "Print information displayed in workspace");
+    make(c_.cmdSaveFile, "cmdSaveFile", "Save", 870, kRowOneTop,
+         "Save information displayed in workspace");
+    make(c_.cmdPrint, "cmdPrint", "Print", 1710, kRowOneTop,
+         "Print information displayed in workspace");
     make(c_.cmdListen, "cmdListen", "Listen", 2550, kRowOneTop);
     make(c_.cmdCurrentData, "cmdCurrentData", "Current Data", 3390, kRowOneTop);
     make(c_.cmdStopCurrentData, "cmdStopCurrentData", "Stop", 3390, kRowOneTop);
@@ -159,9 +163,9 @@ void MainWindow::buildButtons() {
     for (QPushButton* b : {c_.cmdSaveFile, c_.cmdPrint, c_.cmdListen, c_.cmdCurrentData,
                            c_.cmdLoggedData, c_.cmdEraseLog, c_.cmdGLPData})
         b->setEnabled(false);
-    for (QPushButton* b : {c_.cmdStopCurrentData, c_.cmdMaxMin, c_.cmdEnableLogging,
-                           c_.cmdDisableLogging, c_.cmdStartStirring, c_.cmdStopStirring, c_.cmdK5On,
-                           c_.cmdK5Off})
+    for (QPushButton* b :
+         {c_.cmdStopCurrentData, c_.cmdMaxMin, c_.cmdEnableLogging, c_.cmdDisableLogging,
+          c_.cmdStartStirring, c_.cmdStopStirring, c_.cmdK5On, c_.cmdK5Off})
         b->hide();
 }
 

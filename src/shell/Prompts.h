@@ -13,5 +13,6 @@ public:
     virtual ~Prompts() = default;
     // systemModal: the box stays above every window of the program (and of the desktop where
     // the platform allows it).
-    virtual Answer show(const QString& text, Icon icon, Buttons buttons, bool systemModal = false) = 0;
+    virtual Answer show(const QString& text, Icon icon, Buttons buttons,
+                        bool systemModal = false) = 0;
 };

@@ -50,7 +50,9 @@ QString readText(QSettings& store, const char* key, const char* fallback) {
     return v.toString();
 }
 
-QString numberText(double v) { return QString::number(v, 'g', QLocale::FloatingPointShortest); }
+QString numberText(double v) {
+    return QString::number(v, 'g', QLocale::FloatingPointShortest);
+}
 
 QString executableBaseName() {
     const QString base = QFileInfo(QCoreApplication::applicationFilePath()).completeBaseName();

@@ -36,7 +36,8 @@ void whenModal(const QString& objectName, std::function<void(QWidget*)> action, 
             // Watchdog: a dialog the action should have closed must not hang the suite.
             QTimer::singleShot(3000, qApp, [guard, objectName] {
                 if (guard && guard->isVisible() && QApplication::activeModalWidget() == guard) {
-                    failures << QStringLiteral("dialog %1 still open after its action").arg(objectName);
+                    failures
+                        << QStringLiteral("dialog %1 still open after its action").arg(objectName);
                     closeStuck(guard);
                 }
             });
@@ -64,7 +65,8 @@ void click(QWidget* dialog, const QString& buttonName) {
 }
 
 void clickWhenModal(const QString& dialogName, const QString& buttonName, int timeoutMs) {
-    whenModal(dialogName, [buttonName](QWidget* d) { click(d, buttonName); }, timeoutMs);
+    whenModal(
+        dialogName, [buttonName](QWidget* d) { click(d, buttonName); }, timeoutMs);
 }
 
 QStringList takeFailures() {

@@ -11,7 +11,8 @@ class QWidget;
 // (closing the dialog) when none appears or it is still open a while after the action.
 namespace DialogDriver {
 
-void whenModal(const QString& objectName, std::function<void(QWidget*)> action, int timeoutMs = 5000);
+void whenModal(const QString& objectName, std::function<void(QWidget*)> action,
+               int timeoutMs = 5000);
 // Clicks the child button with that object name.
 void click(QWidget* dialog, const QString& buttonName);
 // whenModal + click.

@@ -1,6 +1,7 @@
 #include "PromptRecorder.h"
 
-Prompts::Answer PromptRecorder::show(const QString& text, Icon icon, Buttons buttons, bool systemModal) {
+Prompts::Answer PromptRecorder::show(const QString& text, Icon icon, Buttons buttons,
+                                     bool systemModal) {
     const Shown s{text, icon, buttons, systemModal};
     shown.append(s);
     if (onShow)
@@ -8,9 +9,12 @@ Prompts::Answer PromptRecorder::show(const QString& text, Icon icon, Buttons but
     if (!script_.isEmpty())
         return script_.dequeue();
     switch (buttons) {
-    case Buttons::YesNo: return Answer::No;
-    case Buttons::RetryCancel: return Answer::Cancel;
-    case Buttons::Ok: break;
+    case Buttons::YesNo:
+        return Answer::No;
+    case Buttons::RetryCancel:
+        return Answer::Cancel;
+    case Buttons::Ok:
+        break;
     }
     return Answer::Ok;
 }

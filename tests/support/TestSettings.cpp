@@ -19,7 +19,9 @@ TestSettings::TestSettings() : oldHome_(qgetenv("HOME")) {
     qputenv("XDG_DOCUMENTS_DIR", dir_.filePath("home/Documents").toLocal8Bit());
 }
 
-TestSettings::~TestSettings() { qputenv("HOME", oldHome_); }
+TestSettings::~TestSettings() {
+    qputenv("HOME", oldHome_);
+}
 
 void TestSettings::set(const QString& key, const QString& value) {
     QSettings s(QStringLiteral("Telvio"), QStringLiteral("Telvio"));

@@ -40,9 +40,9 @@ bool WindowFixture::startDetected(const QString& profile, int timeoutMs) {
     if (!startMeter(profile))
         return false;
     start();
-    return waitUntil([this] {
-        return !c().tmrDetectMeter->isActive() && !state().modelCode.isEmpty();
-    }, timeoutMs);
+    return waitUntil(
+        [this] { return !c().tmrDetectMeter->isActive() && !state().modelCode.isEmpty(); },
+        timeoutMs);
 }
 
 bool WindowFixture::waitUntil(const std::function<bool()>& condition, int timeoutMs) {

@@ -5,9 +5,11 @@
 #include "TestClock.h"
 #include "TestSettings.h"
 #include "link/QtSerialLine.h"
+#include "shell/MainControls.h"
 #include "shell/MainWindow.h"
 
 #include <Meter.h>
+#include <QTimer>
 #include <functional>
 #include <memory>
 
