@@ -2,12 +2,21 @@
 
 #include "link/PortNames.h"
 
+#include <QTimer>
+
 QtSerialLine::QtSerialLine(QObject* parent) : SerialLine(parent) {
     connect(&port_, &QSerialPort::readyRead, this, &SerialLine::bytesArrived);
     connect(&port_, &QSerialPort::errorOccurred, this, [this](QSerialPort::SerialPortError e) {
-        if (e == QSerialPort::ResourceError || e == QSerialPort::ReadError ||
-            e == QSerialPort::WriteError)
-            emit failed();
+        if (e != QSerialPort::ResourceError && e != QSerialPort::ReadError &&
+            e != QSerialPort::WriteError)
+            return;
+        // A vanished device keeps its read notifier firing: close the port once control is back
+        // in the event loop, so nothing spins; the next operation then reports the loss.
+        QTimer::singleShot(0, this, [this] {
+            if (port_.isOpen() && port_.error() != QSerialPort::NoError)
+                port_.close();
+        });
+        emit failed();
     });
 }
 
@@ -72,8 +81,8 @@ void QtSerialLine::checkPortError(const char* what) {
         port_.clearError();
         return;
     }
+    // The error stays set: a port that failed keeps failing until it is closed.
     const QString text = port_.errorString();
-    port_.clearError();
     throw SerialError(std::string(what) + ": " + text.toStdString());
 }
 
