@@ -52,7 +52,8 @@ QStringList availableDrives() {
     QStringList drives;
     const QList<QStorageInfo> volumes = QStorageInfo::mountedVolumes();
     for (const QStorageInfo& volume : volumes) {
-        if (!volume.isValid() || !volume.isReady())
+        // Bind-mounted single files show up as volumes too; only folders can hold the page.
+        if (!volume.isValid() || !volume.isReady() || !QFileInfo(volume.rootPath()).isDir())
             continue;
         const QString text = driveText(volume.rootPath());
         if (!text.isEmpty() && !drives.contains(text))

@@ -61,7 +61,7 @@ void HelpWindow::buildControls() {
     text_->setLineWrapMode(QTextEdit::WidgetWidth);
     const QFontMetrics metrics(text_->font());
     text_->setMinimumSize(metrics.horizontalAdvance(QLatin1Char('M')) * 76,
-                          metrics.lineSpacing() * 30);
+                          metrics.lineSpacing() * 32);
     text_->installEventFilter(this);
     installEventFilter(this);
 
