@@ -1,9 +1,12 @@
-#include "HelpTestDoubles.h"
+#include "PdfAndDialogChecks.h"
 #include "help/AboutKvoDialog.h"
 #include "help/AboutTelvioDialog.h"
 #include "help/CatalogDialog.h"
 #include "help/Catalogue.h"
 #include "shell/AppState.h"
+#include "support/DialogDriver.h"
+#include "support/PromptRecorder.h"
+#include "support/ScriptedDialogs.h"
 
 #include <QComboBox>
 #include <QDir>
@@ -45,15 +48,16 @@ private:
     static QString makeCatalogue(const QString& folder);
 
     AppState state_;
-    RecordingPrompts prompts_;
+    PromptRecorder prompts_;
     ScriptedDialogs dialogs_;
     std::unique_ptr<QTemporaryDir> tmp_;
 };
 
 void AboutTest::init() {
+    DialogDriver::takeFailures();
     state_ = AppState();
     state_.catalogDrive = QStringLiteral("d:");
-    prompts_ = RecordingPrompts();
+    prompts_ = PromptRecorder();
     dialogs_ = ScriptedDialogs();
     tmp_ = std::make_unique<QTemporaryDir>();
     QVERIFY(tmp_->isValid());
@@ -117,7 +121,7 @@ void AboutTest::splashMissingOrBroken() {
     AboutKvoDialog box(state_, prompts_, dialogs_, tmp_->path());
     box.show();
     QVERIFY(box.label("imgSplash")->pixmap().isNull());
-    QVERIFY(prompts_.texts.isEmpty());
+    QVERIFY(prompts_.shown.isEmpty());
 }
 
 void AboutTest::splashShownWhenPresent() {
@@ -138,29 +142,27 @@ void AboutTest::emailAndWebOpenThroughSeam() {
     QCOMPARE(dialogs_.openedWithDefault.at(0).path(), box.label("lblEmail")->text());
     QVERIFY(dialogs_.openedWithDefault.at(1).scheme() == QStringLiteral("https"));
     QVERIFY(dialogs_.openedWithDefault.at(1).host().endsWith(box.label("lblWeb")->text().mid(4)));
-    QVERIFY(prompts_.texts.isEmpty());
+    QVERIFY(prompts_.shown.isEmpty());
 }
 
 void AboutTest::failedOpenIsReported() {
     dialogs_.setOpenWithResult(false);
     AboutKvoDialog box(state_, prompts_, dialogs_, tmp_->path());
     QTest::mouseClick(box.label("lblWeb"), Qt::LeftButton);
-    QCOMPARE(prompts_.texts.size(), 1);
-    QCOMPARE(prompts_.icons.at(0), Prompts::Icon::Information);
+    QCOMPARE(prompts_.shown.size(), 1);
+    QCOMPARE(prompts_.shown.at(0).icon, Prompts::Icon::Information);
 }
 
 void AboutTest::catalogueLabelOpensChooser() {
     const QString cd = makeCatalogue(tmp_->filePath("cd"));
     AboutKvoDialog box(state_, prompts_, dialogs_, tmp_->path());
     box.show();
-    ModalDriver driver;
-    driver.whenShown([cd](QWidget* modal) {
+    DialogDriver::whenModal("frmCatalog", [cd](QWidget* modal) {
         modal->findChild<QComboBox*>("drvCatalogue")->setEditText(cd);
-        modal->findChild<QPushButton*>("cmdOK")->click();
+        DialogDriver::click(modal, "cmdOK");
     });
     QTest::mouseClick(box.label("lblCatalogue"), Qt::LeftButton);
-    QCOMPARE(driver.seen, QStringLiteral("frmCatalog"));
-    QVERIFY(!driver.watchdogFired);
+    QCOMPARE(DialogDriver::takeFailures(), QStringList());
     QCOMPARE(state_.catalogDrive, cd);
     QCOMPARE(dialogs_.openedWithDefault, QList<QUrl>{QUrl::fromLocalFile(cd + "/kvo/index.html")});
     // The label follows the drive now remembered.
@@ -244,17 +246,13 @@ void AboutTest::chooserSelectsRememberedDrive() {
     QCOMPARE(chooser.findChild<QLabel*>("Label1")->text(),
              QStringLiteral("Please  insert  CD  in  drive"));
     QCOMPARE(chooser.driveList()->currentText(), selected);
-    QVERIFY(prompts_.texts.isEmpty());
+    QVERIFY(prompts_.shown.isEmpty());
     QCOMPARE(state_.catalogDrive, remembered);
 }
 
 void AboutTest::browseOpensPresentPageAtOnce() {
     state_.catalogDrive = makeCatalogue(tmp_->filePath("cd"));
-    ModalDriver driver;
-    driver.whenShown([](QWidget* modal) { modal->close(); });
-    Catalogue::browse(state_, prompts_, dialogs_, nullptr);
-    QTest::qWait(10); // let the driver look for a dialog that must not be there
-    QCOMPARE(driver.seen, QString());
+    QVERIFY(noModalDuring([this] { Catalogue::browse(state_, prompts_, dialogs_, nullptr); }));
     QCOMPARE(dialogs_.openedWithDefault,
              QList<QUrl>{QUrl::fromLocalFile(state_.catalogDrive + "/kvo/index.html")});
 }
@@ -264,51 +262,47 @@ void AboutTest::browseAbsentRemembersDriveAndSaysNotFound() {
     QDir().mkpath(empty);
     QStringList offered;
     bool stillOpen = false;
-    ModalDriver driver;
-    driver.whenShown([&](QWidget* modal) {
+    DialogDriver::whenModal("frmCatalog", [&](QWidget* modal) {
         auto* list = modal->findChild<QComboBox*>("drvCatalogue");
         for (int i = 0; i < list->count(); ++i)
             offered.append(list->itemText(i));
         list->setEditText(empty);
-        modal->findChild<QPushButton*>("cmdOK")->click();
+        DialogDriver::click(modal, "cmdOK");
         stillOpen = modal->isVisible();
-        modal->findChild<QPushButton*>("cmdCancel")->click();
+        DialogDriver::click(modal, "cmdCancel");
     });
     Catalogue::browse(state_, prompts_, dialogs_, nullptr);
-    QCOMPARE(driver.seen, QStringLiteral("frmCatalog"));
-    QVERIFY(!driver.watchdogFired);
+    QCOMPARE(DialogDriver::takeFailures(), QStringList());
     QVERIFY(offered.contains(Catalogue::defaultDrive()));
     QVERIFY(stillOpen);
-    QCOMPARE(prompts_.texts, QStringList{QStringLiteral("Catalogue  not  found.")});
-    QCOMPARE(prompts_.icons.at(0), Prompts::Icon::Exclamation);
+    QCOMPARE(prompts_.texts(), QStringList{QStringLiteral("Catalogue  not  found.")});
+    QCOMPARE(prompts_.shown.at(0).icon, Prompts::Icon::Exclamation);
     QCOMPARE(state_.catalogDrive, empty); // kept although the page is missing
     QVERIFY(dialogs_.openedWithDefault.isEmpty());
 }
 
 void AboutTest::chooserOpensPageFoundOnChosenDrive() {
     const QString cd = makeCatalogue(tmp_->filePath("cd"));
-    ModalDriver driver;
-    driver.whenShown([&](QWidget* modal) {
+    DialogDriver::whenModal("frmCatalog", [&](QWidget* modal) {
         modal->findChild<QComboBox*>("drvCatalogue")->setEditText(cd);
-        modal->findChild<QPushButton*>("cmdOK")->click();
+        DialogDriver::click(modal, "cmdOK");
     });
     Catalogue::browse(state_, prompts_, dialogs_, nullptr);
-    QVERIFY(!driver.watchdogFired);
-    QVERIFY(prompts_.texts.isEmpty());
+    QCOMPARE(DialogDriver::takeFailures(), QStringList());
+    QVERIFY(prompts_.shown.isEmpty());
     QCOMPARE(state_.catalogDrive, cd);
     QCOMPARE(dialogs_.openedWithDefault, QList<QUrl>{QUrl::fromLocalFile(cd + "/kvo/index.html")});
 }
 
 void AboutTest::chooserCancelChangesNothing() {
-    ModalDriver driver;
-    driver.whenShown([](QWidget* modal) {
+    DialogDriver::whenModal("frmCatalog", [](QWidget* modal) {
         modal->findChild<QComboBox*>("drvCatalogue")->setEditText("/somewhere/else");
-        modal->findChild<QPushButton*>("cmdCancel")->click();
+        DialogDriver::click(modal, "cmdCancel");
     });
     Catalogue::browse(state_, prompts_, dialogs_, nullptr);
-    QCOMPARE(driver.seen, QStringLiteral("frmCatalog"));
+    QCOMPARE(DialogDriver::takeFailures(), QStringList());
     QCOMPARE(state_.catalogDrive, QStringLiteral("d:"));
-    QVERIFY(prompts_.texts.isEmpty());
+    QVERIFY(prompts_.shown.isEmpty());
     QVERIFY(dialogs_.openedWithDefault.isEmpty());
 }
 
@@ -330,10 +324,17 @@ void AboutTest::shellMetacharactersRunNothing() {
     QDir::setCurrent(tmp_->path());
     const QString drive = present ? makeCatalogue(tmp_->filePath(name)) : name;
     state_.catalogDrive = drive;
-    ModalDriver driver;
-    driver.whenShown([](QWidget* modal) { modal->close(); });
+    QString seen;
+    DialogDriver::whenModal(
+        QString(),
+        [&seen](QWidget* modal) {
+            seen = modal->objectName();
+            modal->close();
+        },
+        500);
     Catalogue::browse(state_, prompts_, dialogs_, nullptr);
-    QTest::qWait(50);
+    QTest::qWait(600);
+    DialogDriver::takeFailures(); // "no dialog" is what the present page should give
     QDir::setCurrent(before);
 
     if (present) {
@@ -341,10 +342,10 @@ void AboutTest::shellMetacharactersRunNothing() {
         const QUrl url = dialogs_.openedWithDefault.at(0);
         QVERIFY(url.isLocalFile());
         QCOMPARE(url.toLocalFile(), drive + "/kvo/index.html");
-        QCOMPARE(driver.seen, QString());
+        QCOMPARE(seen, QString());
     } else {
         QVERIFY(dialogs_.openedWithDefault.isEmpty());
-        QCOMPARE(driver.seen, QStringLiteral("frmCatalog")); // closing it changed nothing
+        QCOMPARE(seen, QStringLiteral("frmCatalog")); // closing it changed nothing
         QCOMPARE(state_.catalogDrive, drive);
     }
     const QStringList made = QDir(tmp_->path()).entryList({"PWNED*", "*calc*"});

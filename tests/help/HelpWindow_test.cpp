@@ -1,7 +1,9 @@
-#include "HelpTestDoubles.h"
+#include "PdfAndDialogChecks.h"
 #include "help/HelpFile.h"
 #include "help/HelpWindow.h"
 #include "shell/AppState.h"
+#include "support/PromptRecorder.h"
+#include "support/ScriptedDialogs.h"
 
 #include <QFile>
 #include <QLabel>
@@ -39,7 +41,7 @@ private:
     static QString dataFolder() { return qEnvironmentVariable("TELVIO_DATA_DIR"); }
 
     AppState state_;
-    RecordingPrompts prompts_;
+    PromptRecorder prompts_;
     ScriptedDialogs dialogs_;
     QString pdf_;
     std::unique_ptr<QTemporaryDir> out_;
@@ -51,7 +53,7 @@ static QString collapsed(const QString& text) {
 
 void HelpWindowTest::init() {
     state_ = AppState();
-    prompts_ = RecordingPrompts();
+    prompts_ = PromptRecorder();
     dialogs_ = ScriptedDialogs();
     out_ = std::make_unique<QTemporaryDir>();
     QVERIFY(out_->isValid());
@@ -191,7 +193,7 @@ void HelpWindowTest::enterOnPrintPrintsWholeFile() {
     QTest::keyClick(w->textArea(), Qt::Key_Return);
     QCOMPARE(dialogs_.printDialogs, 1);
     QVERIFY(QFile::exists(pdf_));
-    QVERIFY2(prompts_.texts.isEmpty(), qPrintable(prompts_.texts.join('|')));
+    QVERIFY2(prompts_.shown.isEmpty(), qPrintable(prompts_.texts().join('|')));
 
     const QString text = printedText(pdf_);
     QCOMPARE(text, collapsed(HelpFile::composePrintText(topics, printed)));
@@ -253,7 +255,7 @@ void HelpWindowTest::printCancelledPrintsNothing() {
     QTest::mouseClick(w->printPicture(), Qt::LeftButton);
     QCOMPARE(dialogs_.printDialogs, 1);
     QVERIFY(!QFile::exists(pdf_));
-    QVERIFY(prompts_.texts.isEmpty());
+    QVERIFY(prompts_.shown.isEmpty());
     QVERIFY(w->isVisible());
 }
 
@@ -261,8 +263,8 @@ void HelpWindowTest::printFailureIsReported() {
     dialogs_.printToPdf(out_->filePath("no/such/folder/help.pdf"));
     auto w = open(HelpKind::General);
     QTest::mouseClick(w->printPicture(), Qt::LeftButton);
-    QCOMPARE(prompts_.texts.size(), 1);
-    QCOMPARE(prompts_.icons.at(0), Prompts::Icon::Information);
+    QCOMPARE(prompts_.shown.size(), 1);
+    QCOMPARE(prompts_.shown.at(0).icon, Prompts::Icon::Information);
     QVERIFY(w->isVisible());
     // The window stays usable.
     QTest::keyClick(w->textArea(), Qt::Key_Down);
