@@ -16,3 +16,23 @@ qsizetype FindText::find(const QString& text, const QString& search, qsizetype f
     }
     return 0;
 }
+
+qsizetype FindText::documentPosition(const QString& text, qsizetype textIndex) {
+    const qsizetype end = qBound<qsizetype>(0, textIndex, text.size());
+    qsizetype pairs = 0;
+    for (qsizetype k = text.indexOf(u'\r'); k >= 0 && k + 1 < end; k = text.indexOf(u'\r', k + 1)) {
+        if (text[k + 1] == u'\n')
+            ++pairs;
+    }
+    return end - pairs;
+}
+
+qsizetype FindText::textIndex(const QString& text, qsizetype documentPosition) {
+    qsizetype index = 0;
+    for (qsizetype doc = 0; doc < documentPosition && index < text.size(); ++doc) {
+        if (text[index] == u'\r' && index + 1 < text.size() && text[index + 1] == u'\n')
+            ++index;
+        ++index;
+    }
+    return index;
+}

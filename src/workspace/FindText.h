@@ -9,4 +9,9 @@
 class FindText {
 public:
     static qsizetype find(const QString& text, const QString& search, qsizetype findStart);
+
+    // The workspace control turns each CR LF of the text into one line break, so positions
+    // after it are one less there. These map a 0-based index between the two.
+    static qsizetype documentPosition(const QString& text, qsizetype textIndex);
+    static qsizetype textIndex(const QString& text, qsizetype documentPosition);
 };

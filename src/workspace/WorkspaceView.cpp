@@ -12,6 +12,7 @@ void WorkspaceView::configure(QPlainTextEdit& edit) {
     edit.setReadOnly(true);
     edit.setTextInteractionFlags(Qt::TextSelectableByMouse | Qt::TextSelectableByKeyboard);
     edit.setUndoRedoEnabled(false);
+    edit.setLineWrapMode(QPlainTextEdit::NoWrap);
     edit.setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOn);
     edit.setContextMenuPolicy(Qt::CustomContextMenu);
 }

@@ -1,0 +1,48 @@
+#include "workspace/WindowLayout.h"
+
+#include "shell/MainWindow.h"
+#include "shell/Twips.h"
+
+#include <QFrame>
+#include <QLabel>
+#include <QPlainTextEdit>
+#include <QProgressBar>
+
+void WindowLayout::apply() {
+    if (w_.isMinimized())
+        return;
+    const QRect frame = w_.frameGeometry();
+    int width = pixelsToTwips(frame.width());
+    int height = pixelsToTwips(frame.height());
+    if (!w_.isMaximized() && !w_.isFullScreen() && (width < kMinWidth || height < kMinHeight)) {
+        width = qMax(width, kMinWidth);
+        height = qMax(height, kMinHeight);
+        // The frame itself (title bar, borders) is not part of resize()'s size.
+        const int frameW = frame.width() - w_.width();
+        const int frameH = frame.height() - w_.height();
+        w_.resize(twipsToPixels(width) - frameW, twipsToPixels(height) - frameH);
+    }
+
+    const MainControls& c = w_.controls();
+    const AppState& s = w_.state();
+    int workspaceHeight = height - (s.isK5Family ? 3530 : 2510);
+    if (s.percentFormat)
+        workspaceHeight -= 340;
+    c.RichTextBox1->resize(qMax(0, twipsToPixels(width - 60)),
+                           qMax(0, twipsToPixels(workspaceHeight)));
+
+    for (QWidget* label :
+         {static_cast<QWidget*>(c.lblModel), static_cast<QWidget*>(c.lblVersion),
+          static_cast<QWidget*>(c.lblModelData), static_cast<QWidget*>(c.lblVersionData),
+          static_cast<QWidget*>(c.lblSerial), static_cast<QWidget*>(c.lblNumLog),
+          static_cast<QWidget*>(c.lblSerialData), static_cast<QWidget*>(c.lblNumLogData)})
+        MainWindow::setTopTwips(label, height - 1050);
+    MainWindow::setTopTwips(c.lblMessage, height - 1360);
+    MainWindow::setTopTwips(c.ProgressBar1, height - 1360);
+
+    // A horizontal line at the status area's top edge, running to the right edge.
+    QFrame* line = c.Line1;
+    line->setGeometry(line->x(), twipsToPixels(height - 1050) - line->height() / 2,
+                      qMax(1, twipsToPixels(width) - line->x()), line->height());
+    MainWindow::setLeftTwips(c.picKVOLogo, width - 1150);
+}
