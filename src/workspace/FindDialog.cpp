@@ -10,6 +10,7 @@
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QTextCursor>
+#include <QTextDocumentFragment>
 #include <QVBoxLayout>
 #include <QWindow>
 

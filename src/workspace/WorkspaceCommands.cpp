@@ -168,5 +168,3 @@ void WorkspaceCommands::Find() {
         find_ = std::make_unique<FindDialog>(w_);
     find_->start();
 }
-
-void WorkspaceCommands::ShowFormatDialog() {}
