@@ -45,6 +45,7 @@ double bareRoundTripUs(QtSerialLine& line, int n) {
         times.push_back(double(t.nsecsElapsed()) / 1000.0);
     }
     std::sort(times.begin(), times.end());
+    std::printf("bare line round trip 99th pct %.1f us\n", times[times.size() * 99 / 100]);
     return times[times.size() / 2];
 }
 } // namespace
