@@ -158,21 +158,18 @@ void HelpWindow::PrintHelpFile() {
     QPrinter printer;
     if (!dialogs_.askPrinter(this, printer))
         return;
-    if (!printer.isValid()) {
-        prompts_.show(QStringLiteral("No printer is available."), Prompts::Icon::Information,
-                      Prompts::Buttons::Ok);
-        return;
-    }
     // A hidden document of its own: the window keeps showing its topic.
     QTextDocument document;
-    document.setDefaultFont(fixedFont(QStringLiteral("Courier New"), 10));
+    document.setDefaultFont(fixedFont(QStringLiteral("Courier New"), 9.75));
     const QString text = HelpFile::composePrintText(state_.helpTopics, HelpFile::printIndex(kind_));
     document.setPlainText(displayText(text));
-    document.print(&printer);
-    if (printer.printerState() == QPrinter::Error) {
-        prompts_.show(
-            QStringLiteral("The printer reported an error: the help file was not printed."),
-            Prompts::Icon::Information, Prompts::Buttons::Ok);
+    if (printer.isValid())
+        document.print(&printer);
+    if (!printer.isValid() || printer.printerState() == QPrinter::Error) {
+        const QString target =
+            printer.outputFileName().isEmpty() ? printer.printerName() : printer.outputFileName();
+        prompts_.show(QStringLiteral("The help file could not be printed on %1.").arg(target),
+                      Prompts::Icon::Information, Prompts::Buttons::Ok);
     }
 }
 

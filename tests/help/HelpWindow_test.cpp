@@ -265,6 +265,7 @@ void HelpWindowTest::printFailureIsReported() {
     QTest::mouseClick(w->printPicture(), Qt::LeftButton);
     QCOMPARE(prompts_.shown.size(), 1);
     QCOMPARE(prompts_.shown.at(0).icon, Prompts::Icon::Information);
+    QVERIFY(prompts_.shown.at(0).text.contains("no/such/folder/help.pdf"));
     QVERIFY(w->isVisible());
     // The window stays usable.
     QTest::keyClick(w->textArea(), Qt::Key_Down);
