@@ -23,6 +23,16 @@ qsizetype wordAt(const QString& text, qsizetype from, std::optional<QString>& wo
     return end;
 }
 
+// The serial number of a plain reply: a meter without a log sends nothing after it, so the
+// reply's closing CR ends it as well as a space does.
+void serialAt(const QString& text, qsizetype from, std::optional<QString>& serial) {
+    if (wordAt(text, from, serial) >= 0)
+        return;
+    const qsizetype cr = text.indexOf(u'\r', from);
+    if (cr >= 0)
+        serial = text.mid(from, cr - from);
+}
+
 void parsePlain(const QString& reply, const QString& currentModelCode, StatusReply& r) {
     std::optional<QString> second;
     const qsizetype modelEnd = wordAt(reply, 0, r.modelCode);
@@ -39,7 +49,7 @@ void parsePlain(const QString& reply, const QString& currentModelCode, StatusRep
     } else {
         r.firmwareVersion = second;
         if (secondEnd >= 0)
-            wordAt(reply, skipSpaces(reply, secondEnd), r.serialNumber);
+            serialAt(reply, skipSpaces(reply, secondEnd), r.serialNumber);
     }
 
     const QString held = r.modelCode.value_or(currentModelCode);

@@ -110,6 +110,10 @@ void StatusReplyTest::fields_data() {
                                               << "" << Format::Plain << "K50"
                                               << "1.0"
                                               << "S1" << keepCount << "";
+    QTest::newRow("plain serial ended by CR") << "K51 1.0 S1\r"
+                                              << "" << Format::Plain << "K51"
+                                              << "1.0"
+                                              << "S1" << keepCount << "";
     QTest::newRow("plain serial without space") << "K51 1.0 S1"
                                                 << "" << Format::Plain << "K51"
                                                 << "1.0" << keep << keepCount << "";
