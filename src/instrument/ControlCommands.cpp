@@ -208,11 +208,11 @@ void ControlCommands::mnuVoltage_Click() {
 
 void ControlCommands::tmrDisplayVoltage_Timer() {
     Exchange& exchange = w_.exchange();
+    const MainControls& c = w_.controls();
+    c.tmrDisplayVoltage->setInterval(2000);
     // A tick inside another exchange's prompt, or while frmCommError is open, waits its turn.
     if (exchange.inProgress())
         return;
-    const MainControls& c = w_.controls();
-    c.tmrDisplayVoltage->setInterval(2000);
     if (!exchange.ExchangeCommand(QStringLiteral("?V"))) {
         voltageLinkFailed();
         return;
