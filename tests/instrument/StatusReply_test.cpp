@@ -1,5 +1,6 @@
 #include "instrument/StatusReply.h"
 
+#include <QRandomGenerator>
 #include <QTest>
 
 using Format = StatusReply::Format;
@@ -32,6 +33,7 @@ private slots:
     void versionReply();
     void count_data();
     void count();
+    void randomReplies();
 };
 
 void StatusReplyTest::fields_data() {
@@ -325,6 +327,32 @@ void StatusReplyTest::count_data() {
 void StatusReplyTest::count() {
     QFETCH(QString, field);
     QTEST(shown(parseCount(field)), "value");
+}
+
+void StatusReplyTest::randomReplies() {
+    // Replies glued from pieces that steer the parser down every path, plus any byte: the
+    // parser must neither crash nor deliver a field that breaks the reply's own rules.
+    const QStringList pieces = {"K5",  "K51", "K50", "AH", "QR32", "ZUM410", "QR34", " ", " ",
+                                "%",   "n",   "l",   "g",  "\r",   "0042",   "+",    "m", "B",
+                                "ERR", "OR",  "9",   "v",  "\n",   "\t",     "\x01"};
+    QRandomGenerator random(20261206);
+    for (int i = 0; i < 20000; ++i) {
+        QString reply;
+        const int parts = random.bounded(12);
+        for (int p = 0; p < parts; ++p) {
+            if (random.bounded(4) == 0)
+                reply += QChar(char16_t(1 + random.bounded(255)));
+            else
+                reply += pieces[random.bounded(pieces.size())];
+        }
+        StatusReply r = parseStatusReply(reply, random.bounded(2) ? "QR32" : "K5AH");
+        if (r.needsVersionQuery)
+            parseVersionReply(reply, r);
+        QVERIFY2(!r.numLogged || *r.numLogged >= 0, qPrintable(reply));
+        QVERIFY2(r.capabilityText.size() <= reply.size(), qPrintable(reply));
+        if (r.format == Format::Percent || r.format == Format::Plain)
+            QVERIFY2(!r.modelCode || !r.modelCode->contains(u' '), qPrintable(reply));
+    }
 }
 
 QTEST_APPLESS_MAIN(StatusReplyTest)
