@@ -1,6 +1,7 @@
 #include "help/HelpWindow.h"
 
 #include "help/HelpIcons.h"
+#include "help/PrintDocument.h"
 #include "shell/AppState.h"
 #include "shell/PlatformDialogs.h"
 #include "shell/Prompts.h"
@@ -163,13 +164,14 @@ void HelpWindow::PrintHelpFile() {
     document.setDefaultFont(fixedFont(QStringLiteral("Courier New"), 9.75));
     const QString text = HelpFile::composePrintText(state_.helpTopics, HelpFile::printIndex(kind_));
     document.setPlainText(displayText(text));
-    if (printer.isValid())
-        document.print(&printer);
-    if (!printer.isValid() || printer.printerState() == QPrinter::Error) {
+    if (!printDocument(document, printer)) {
         const QString target =
             printer.outputFileName().isEmpty() ? printer.printerName() : printer.outputFileName();
-        prompts_.show(QStringLiteral("The help file could not be printed on %1.").arg(target),
-                      Prompts::Icon::Information, Prompts::Buttons::Ok);
+        prompts_.show(
+            target.isEmpty()
+                ? QStringLiteral("The help file could not be printed: no printer is set up.")
+                : QStringLiteral("The help file could not be printed on %1.").arg(target),
+            Prompts::Icon::Information, Prompts::Buttons::Ok);
     }
 }
 
