@@ -37,6 +37,7 @@ private slots:
     void blowShowsOnlyBatteryMessage();
     void powerOffSequence();
     void powerOffRefused();
+    void powerOnDetectsAgain_data();
     void powerOnDetectsAgain();
     void eraseConfirmed();
     void eraseRefused();
@@ -159,15 +160,28 @@ void ControlCommandsTest::powerOffRefused() {
     QVERIFY(f.c().cmdK5Off->isEnabled());
 }
 
+void ControlCommandsTest::powerOnDetectsAgain_data() {
+    QTest::addColumn<bool>("fromMenu");
+    QTest::newRow("Power On") << false;
+    QTest::newRow("Detect Meter") << true;
+}
+
 void ControlCommandsTest::powerOnDetectsAgain() {
+    QFETCH(bool, fromMenu);
     WindowFixture f;
     QVERIFY(f.startDetected("k5ac"));
     f.c().cmdK5Off->click();
     QCOMPARE(f.c().lblModelData->text(), QString());
-    f.c().cmdK5On->click();
+    // The meter stays silent after "SSD" until it is woken again.
+    if (fromMenu)
+        f.c().mnuDetectMeter->trigger();
+    else
+        f.c().cmdK5On->click();
     QVERIFY(f.waitUntil([&] { return f.c().lblModelData->text() == QLatin1String("K5AC"); }));
     QVERIFY(f.c().cmdK5Off->isEnabled());
+    QVERIFY(f.c().cmdEraseLog->isEnabled());
     QVERIFY(f.serial.isOpen());
+    QCOMPARE(f.c().lblMessage->text(), QString());
 }
 
 void ControlCommandsTest::eraseConfirmed() {
