@@ -11,7 +11,8 @@ bool isBlank(QChar c) {
 
 QString DelimitedFieldReader::toWorkspaceText(QStringView text) {
     QString out;
-    out.reserve(text.size() + text.size() / 8);
+    // The items and their line feeds never take more room than the text (one more at most).
+    out.reserve(text.size() + 2);
     const qsizetype n = text.size();
     qsizetype i = 0;
     // True right after a comma: an item follows even when the text or the line ends there.

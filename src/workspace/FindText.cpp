@@ -10,7 +10,9 @@ qsizetype FindText::find(const QString& text, const QString& search, qsizetype f
             return p + 1;
     }
     if (findStart >= 2) {
-        const qsizetype p = text.indexOf(search, 0, Qt::CaseInsensitive);
+        // Only matches that begin at positions 1 to findStart count: search no further.
+        const QStringView head = QStringView(text).left(findStart - 1 + search.size());
+        const qsizetype p = head.indexOf(search, 0, Qt::CaseInsensitive);
         if (p >= 0 && p + 1 <= findStart)
             return p + 1;
     }
