@@ -31,11 +31,10 @@ void WindowLayout::apply() {
     c.RichTextBox1->resize(qMax(0, twipsToPixels(width - 60)),
                            qMax(0, twipsToPixels(workspaceHeight)));
 
-    for (QWidget* label :
-         {static_cast<QWidget*>(c.lblModel), static_cast<QWidget*>(c.lblVersion),
-          static_cast<QWidget*>(c.lblModelData), static_cast<QWidget*>(c.lblVersionData),
-          static_cast<QWidget*>(c.lblSerial), static_cast<QWidget*>(c.lblNumLog),
-          static_cast<QWidget*>(c.lblSerialData), static_cast<QWidget*>(c.lblNumLogData)})
+    const std::initializer_list<QWidget*> statusLabels{
+        c.lblModel,  c.lblVersion, c.lblModelData,  c.lblVersionData,
+        c.lblSerial, c.lblNumLog,  c.lblSerialData, c.lblNumLogData};
+    for (QWidget* label : statusLabels)
         MainWindow::setTopTwips(label, height - 1050);
     MainWindow::setTopTwips(c.lblMessage, height - 1360);
     MainWindow::setTopTwips(c.ProgressBar1, height - 1360);

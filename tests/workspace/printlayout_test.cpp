@@ -136,10 +136,10 @@ private slots:
         resizeTo(880, 690);
         QCOMPARE(ws->edit()->width(), twipsToPixels(W() - 60));
         QCOMPARE(ws->edit()->height(), twipsToPixels(H() - less));
-        for (QWidget* label :
-             {(QWidget*)c().lblModel, (QWidget*)c().lblVersion, (QWidget*)c().lblModelData,
-              (QWidget*)c().lblVersionData, (QWidget*)c().lblSerial, (QWidget*)c().lblNumLog,
-              (QWidget*)c().lblSerialData, (QWidget*)c().lblNumLogData})
+        const std::initializer_list<QWidget*> statusLabels{
+            c().lblModel,  c().lblVersion, c().lblModelData,  c().lblVersionData,
+            c().lblSerial, c().lblNumLog,  c().lblSerialData, c().lblNumLogData};
+        for (QWidget* label : statusLabels)
             QCOMPARE(label->y(), twipsToPixels(H() - 1050));
         QCOMPARE(c().lblMessage->y(), twipsToPixels(H() - 1360));
         QCOMPARE(c().ProgressBar1->y(), twipsToPixels(H() - 1360));
