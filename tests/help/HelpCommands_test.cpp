@@ -25,6 +25,7 @@ private slots:
     void helpFromMenuPrintsThroughSeam();
     void cataloguePresentOpensWithoutChooser();
     void captionAndAboutBoxShowOneVersion();
+    void realVoltageDisplayStopsForHelpOnly();
 };
 
 // A voltage display in progress, as far as the Help commands can see it.
@@ -155,6 +156,29 @@ void HelpCommandsTest::captionAndAboutBoxShowOneVersion() {
     QCOMPARE(version, AboutTelvioDialog::versionText());
     QCOMPARE(version, QStringLiteral("Version : v1.36"));
     QCOMPARE(f.window->windowTitle(), QStringLiteral("  Telvio  v1.36"));
+}
+
+// Against a meter that reports its battery voltage: About Telvio leaves the display running,
+// Help (General) ends it and empties the workspace.
+void HelpCommandsTest::realVoltageDisplayStopsForHelpOnly() {
+    WindowFixture f;
+    QVERIFY(f.startDetected(QStringLiteral("percent-log")));
+    QVERIFY(f.c().mnuVoltage->isVisible());
+    f.c().mnuVoltage->trigger();
+    QVERIFY(f.waitUntil(
+        [&] { return f.c().RichTextBox1->toPlainText().startsWith("Meter Battery Voltage = "); }));
+
+    DialogDriver::clickWhenModal("frmAboutTelvio", "cmdOK");
+    f.c().mnuAboutTelvio->trigger();
+    QVERIFY(f.c().tmrDisplayVoltage->isActive());
+    QVERIFY(!f.c().RichTextBox1->toPlainText().isEmpty());
+
+    DialogDriver::whenModal("frmHelp", [](QWidget* modal) { modal->close(); });
+    f.c().mnuHelpGeneral->trigger();
+    QCOMPARE(DialogDriver::takeFailures(), QStringList());
+    QVERIFY(!f.c().tmrDisplayVoltage->isActive());
+    QCOMPARE(f.c().RichTextBox1->toPlainText(), QString());
+    QCOMPARE(f.state().workspaceText, QString());
 }
 
 QTEST_MAIN(HelpCommandsTest)
