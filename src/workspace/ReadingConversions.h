@@ -6,6 +6,12 @@
 // The unit and asterisk conversions applied to the whole workspace once a download ends.
 // Every edit replaces characters in place: the text never changes length, and converting text
 // that was already converted changes nothing more (converted units carry their new name).
+//
+// A unit is looked for from the fifth character on; its value field is the six characters
+// before it, or the four or five there are when it stands fifth or sixth. A rendering longer
+// than the field overwrites what stands before it on the same line; when it would reach past
+// the start of the text or into the previous line, the field is left as it was (the unit is
+// still renamed), so no line is ever damaged.
 struct ReadingConversions {
     bool msToUs = false;    // "mS" -> "uS", value times 1000
     bool ppkToPpm = false;  // "ppK" -> "ppM", value times 1000
