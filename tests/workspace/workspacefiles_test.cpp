@@ -1,6 +1,5 @@
 #include "workspace/DelimitedFieldReader.h"
 #include "workspace/FindText.h"
-#include "workspace/SaveNames.h"
 #include "workspace/TextFileCodec.h"
 
 #include <QTest>
@@ -14,11 +13,6 @@ private slots:
     void roundTripsEncoding();
     void decodesBytes_data();
     void decodesBytes();
-    void namesDefaultFile_data();
-    void namesDefaultFile();
-    void offersFilters();
-    void addsExtension_data();
-    void addsExtension();
     void finds_data();
     void finds();
 };
@@ -103,72 +97,6 @@ void WorkspaceFilesTest::decodesBytes() {
     QFETCH(QByteArray, bytes);
     QFETCH(QString, expected);
     QCOMPARE(TextFileCodec::decode(bytes), expected);
-}
-
-void WorkspaceFilesTest::namesDefaultFile_data() {
-    QTest::addColumn<QString>("kind");
-    QTest::addColumn<QString>("expected");
-    QTest::newRow("glp") << "glp"
-                         << "GLP data";
-    QTest::newRow("log") << "log"
-                         << "Log data";
-    QTest::newRow("real time") << "realTime"
-                               << "Current data";
-    QTest::newRow("max min") << "maxMin"
-                             << "MaxMin data";
-    QTest::newRow("voltage") << "voltage"
-                             << "Voltage data";
-    QTest::newRow("listen") << "listen"
-                            << "Instrument data";
-    QTest::newRow("nothing") << ""
-                             << "Instrument data";
-    QTest::newRow("later wins") << "glp voltage log"
-                                << "Voltage data";
-}
-
-static DisplayKind kindFrom(const QString& words) {
-    DisplayKind k;
-    k.glp = words.contains(QLatin1String("glp"));
-    k.log = words.contains(QLatin1String("log"));
-    k.realTime = words.contains(QLatin1String("realTime"));
-    k.maxMin = words.contains(QLatin1String("maxMin"));
-    k.voltage = words.contains(QLatin1String("voltage"));
-    k.listen = words.contains(QLatin1String("listen"));
-    return k;
-}
-
-void WorkspaceFilesTest::namesDefaultFile() {
-    QFETCH(QString, kind);
-    QFETCH(QString, expected);
-    QCOMPARE(SaveNames::defaultName(kindFrom(kind)), expected);
-}
-
-void WorkspaceFilesTest::offersFilters() {
-    const QStringList both{"Text File   (*.txt)", "Comma Delimited    (*.csv)"};
-    const QStringList plain{"Text File   (*.txt)"};
-    for (const char* k : {"log", "realTime", "listen"})
-        QCOMPARE(SaveNames::saveFilters(kindFrom(QLatin1String(k))), both);
-    for (const char* k : {"glp", "maxMin", "voltage", ""})
-        QCOMPARE(SaveNames::saveFilters(kindFrom(QLatin1String(k))), plain);
-    QCOMPARE(SaveNames::openFilters(), QStringList{"All Files   (*.*)"});
-}
-
-void WorkspaceFilesTest::addsExtension_data() {
-    QTest::addColumn<QString>("path");
-    QTest::addColumn<int>("filter");
-    QTest::addColumn<QString>("expected");
-    QTest::newRow("txt") << "/data/Log data" << 0 << "/data/Log data.txt";
-    QTest::newRow("csv") << "/data/Log data" << 1 << "/data/Log data.csv";
-    QTest::newRow("own extension kept") << "/data/run.dat" << 1 << "/data/run.dat";
-    QTest::newRow("trailing dot kept") << "/data/run." << 0 << "/data/run.";
-    QTest::newRow("dot in folder") << "/data/v1.2/run" << 0 << "/data/v1.2/run";
-}
-
-void WorkspaceFilesTest::addsExtension() {
-    QFETCH(QString, path);
-    QFETCH(int, filter);
-    QFETCH(QString, expected);
-    QCOMPARE(SaveNames::withDefaultExtension(path, filter), expected);
 }
 
 void WorkspaceFilesTest::finds_data() {
