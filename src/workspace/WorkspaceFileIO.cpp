@@ -33,13 +33,17 @@ bool WorkspaceFileIO::write(const QString& path, const QString& text, bool appen
             error = file.errorString();
             return false;
         }
+        // A full disk can take part of the text: cut the file back to what it held before.
+        const qint64 before = file.size();
         if (file.write(bytes) != bytes.size() || !file.flush()) {
             error = file.errorString();
+            file.resize(before);
             return false;
         }
         file.close();
         if (file.error() != QFileDevice::NoError) {
             error = file.errorString();
+            QFile::resize(path, before);
             return false;
         }
         return true;
