@@ -2,6 +2,7 @@
 
 #include "link/PortNames.h"
 
+#include <QFileInfo>
 #include <QSerialPort>
 #include <QSerialPortInfo>
 #include <algorithm>
@@ -11,6 +12,13 @@ namespace PortProbe {
 Outcome probe(const QString& portName) {
     if (portName.isEmpty())
         return Outcome::Missing;
+#ifndef Q_OS_WIN
+    // A name with no device behind it is missing. QSerialPort would first try to create its lock
+    // file, which fails for names too long for a file name, and report that as a permission
+    // error: the port would be called "in use".
+    if (!QFileInfo::exists(PortNames::platformPath(portName)))
+        return Outcome::Missing;
+#endif
     QSerialPort port;
     port.setPortName(PortNames::platformPath(portName));
     if (port.open(QIODevice::ReadWrite)) {
