@@ -61,5 +61,8 @@ int main(int argc, char** argv) {
                 "(%ld MB before opening, %ld MB after reading)\n",
                 static_cast<long long>(mib), static_cast<long long>(edit.blockCount()), readMs,
                 totalMs, totalCpuMs, peakKb() / 1024, before / 1024, afterRead / 1024);
+    std::printf("RESULT open_%lldMiB_ms %.0f ms 1000\n", static_cast<long long>(mib), totalMs);
+    std::printf("RESULT open_%lldMiB_peak_MB %ld MB 150\n", static_cast<long long>(mib),
+                peakKb() / 1024);
     return 0;
 }
