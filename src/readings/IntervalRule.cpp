@@ -1,5 +1,7 @@
 #include "readings/IntervalRule.h"
 
+#include "instrument/ModelTable.h"
+
 #include <QLocale>
 #include <algorithm>
 #include <cmath>
@@ -17,13 +19,8 @@ int IntervalRule::minimumForBaud(qint32 baudRate) {
     }
 }
 
-bool IntervalRule::needsTwoSeconds(const QString& modelCode) {
-    return modelCode.contains(QLatin1String("LXT"), Qt::CaseInsensitive) ||
-           modelCode == QLatin1String("K50V3");
-}
-
 int IntervalRule::minimumSeconds(qint32 baudRate, const QString& modelCode) {
-    return std::max(minimumForBaud(baudRate), needsTwoSeconds(modelCode) ? 2 : 1);
+    return std::max(minimumForBaud(baudRate), modeltable::modelMinimumIntervalSeconds(modelCode));
 }
 
 IntervalRule::Result IntervalRule::check(const QString& entry, qint32 baudRate,

@@ -15,8 +15,8 @@ public:
 
     // Slow lines cannot carry a reading every second.
     static int minimumForBaud(qint32 baudRate);
-    // Models that need two seconds per reading whatever the line speed ("LXT" models, K50V3).
-    static bool needsTwoSeconds(const QString& modelCode);
+    // The baud-rate minimum, raised to what the model itself needs (two seconds for the "LXT"
+    // models and K50V3, which cannot answer every second).
     static int minimumSeconds(qint32 baudRate, const QString& modelCode);
 
     static Result check(const QString& entry, qint32 baudRate, const QString& modelCode);

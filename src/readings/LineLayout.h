@@ -1,5 +1,6 @@
 #pragma once
 
+#include "instrument/ModelTable.h"
 #include "shell/AppState.h"
 
 #include <QString>
@@ -13,18 +14,13 @@ struct LineLayout {
     bool marinLago = false;     // 16-character date/time field, two characters dropped
     bool qr32 = false;          // fixed 36-character records, own download protocol
 
-    static bool isMarinLago(const QString& modelCode) {
-        return modelCode.left(5) == QLatin1String("marin") ||
-               modelCode.left(4) == QLatin1String("lago");
-    }
-
     static LineLayout fromState(const AppState& s) {
         LineLayout l;
         l.percentFormat = s.percentFormat;
         l.hasLog = s.hasLog;
         l.isK5Family = s.isK5Family;
-        l.marinLago = isMarinLago(s.modelCode);
-        l.qr32 = s.modelCode == QLatin1String("QR32");
+        l.marinLago = modeltable::usesShortDateTime(s.modelCode);
+        l.qr32 = modeltable::usesQr32Layout(s.modelCode);
         return l;
     }
 };

@@ -129,12 +129,18 @@ void LineRulesTest::reformat() {
 }
 
 void LineRulesTest::marinLagoModelCodes() {
-    QVERIFY(LineLayout::isMarinLago(QStringLiteral("marin")));
-    QVERIFY(LineLayout::isMarinLago(QStringLiteral("marine2")));
-    QVERIFY(LineLayout::isMarinLago(QStringLiteral("lago3")));
-    QVERIFY(!LineLayout::isMarinLago(QStringLiteral("Marin")));
-    QVERIFY(!LineLayout::isMarinLago(QStringLiteral("mari")));
-    QVERIFY(!LineLayout::isMarinLago(QStringLiteral("xlago")));
+    // The layout the download uses comes from the identity: marin/lago by model code prefix.
+    AppState s;
+    for (const char* code : {"marin", "marine2", "lago3"}) {
+        s.modelCode = QString::fromLatin1(code);
+        QVERIFY2(LineLayout::fromState(s).marinLago, code);
+    }
+    for (const char* code : {"Marin", "mari", "xlago", "QR32"}) {
+        s.modelCode = QString::fromLatin1(code);
+        QVERIFY2(!LineLayout::fromState(s).marinLago, code);
+    }
+    s.modelCode = QStringLiteral("QR32");
+    QVERIFY(LineLayout::fromState(s).qr32);
 }
 
 void LineRulesTest::qr32Record_data() {
