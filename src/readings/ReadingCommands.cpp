@@ -1,9 +1,131 @@
 #include "readings/ReadingCommands.h"
 
+#include "link/Exchange.h"
+#include "link/SerialLine.h"
+#include "readings/HeaderPosition.h"
+#include "readings/ListenMode.h"
+#include "readings/LogDownload.h"
+#include "readings/RealTimeRun.h"
+#include "readings/RecordDownload.h"
+#include "readings/ReplyWords.h"
 #include "shell/MainWindow.h"
+#include "shell/Settings.h"
+#include "workspace/WorkspaceCommands.h"
 
-ReadingCommands::ReadingCommands(MainWindow& window) : QObject(&window), w_(window) {}
+#include <QAction>
+#include <QLabel>
+#include <QPushButton>
+#include <QTimer>
 
-void ReadingCommands::GetHeaderAndPosition() {}
+ReadingCommands::ReadingCommands(MainWindow& window)
+    : QObject(&window), w_(window), s_(window.state()), log_(std::make_unique<LogDownload>(window)),
+      realTime_(std::make_unique<RealTimeRun>(window, *this)),
+      records_(std::make_unique<RecordDownload>(window)),
+      listen_(std::make_unique<ListenMode>(window)) {
+    connectControls();
+}
 
-void ReadingCommands::cmdStopCurrentData_Click() {}
+ReadingCommands::~ReadingCommands() = default;
+
+void ReadingCommands::connectMenu(QAction* action, std::function<void()> run) {
+    connect(action, &QAction::triggered, this, [action, run](bool checked) {
+        if (action->isCheckable())
+            action->setChecked(!checked);
+        run();
+    });
+}
+
+void ReadingCommands::connectControls() {
+    const MainControls& c = w_.controls();
+    connect(c.cmdLoggedData, &QPushButton::clicked, this, [this] { log_->DownloadLog(); });
+    connectMenu(c.mnuLog, [this] { log_->DownloadLog(); });
+    connect(c.cmdCurrentData, &QPushButton::clicked, this,
+            [this] { realTime_->cmdCurrentData_Click(); });
+    connectMenu(c.mnuRealTime, [this] { realTime_->cmdCurrentData_Click(); });
+    connect(c.cmdGLPData, &QPushButton::clicked, this, [this] { records_->DisplayGLP(); });
+    connectMenu(c.mnuGLP, [this] { records_->DisplayGLP(); });
+    connect(c.cmdMaxMin, &QPushButton::clicked, this, [this] {
+        w_.controls().lblHeader->clear();
+        records_->DisplayMaxMin();
+    });
+    connectMenu(c.mnuMaxMin, [this] {
+        w_.StopVoltageDisplay();
+        w_.controls().lblHeader->clear();
+        records_->DisplayMaxMin();
+    });
+    connect(c.cmdListen, &QPushButton::clicked, this, [this] { listen_->ListenForData(); });
+    connectMenu(c.mnuListen, [this] { listen_->ListenForData(); });
+    connect(c.cmdStopCurrentData, &QPushButton::clicked, this,
+            &ReadingCommands::cmdStopCurrentData_Click);
+
+    connect(c.tmrRealTime, &QTimer::timeout, this, [this] { realTime_->tmrRealTime_Timer(); });
+    connect(c.tmrLong, &QTimer::timeout, this, [this] { realTime_->tmrLong_Timer(); });
+    connect(c.tmrDisplayInterval, &QTimer::timeout, this,
+            [this] { realTime_->tmrDisplayInterval_Timer(); });
+}
+
+void ReadingCommands::GetHeaderAndPosition() {
+    Exchange& exchange = w_.exchange();
+    if (!exchange.ExchangeCommand(QStringLiteral("?H")))
+        return;
+    if (replywords::unusable(s_.responseText)) {
+        s_.headerText.clear();
+        s_.positionText.clear();
+        logColumnKnown_ = false;
+        return;
+    }
+    s_.headerText = HeaderPosition::headerFor(s_.responseText, s_.hasLog);
+
+    if (!exchange.ExchangeCommand(QStringLiteral("?P")))
+        return;
+    if (replywords::unusable(s_.responseText)) {
+        s_.headerText.clear();
+        s_.positionText.clear();
+        logColumnKnown_ = false;
+        return;
+    }
+    s_.positionText = s_.responseText;
+    if (!s_.hasLog) {
+        s_.logColumnWidth = 4;
+        logColumnKnown_ = false;
+        return;
+    }
+    // A header without "Log" or positions with too few fields leave the previous column values
+    // alone, and real-time lines then keep the meter's own log number.
+    const HeaderPosition::LogColumn column =
+        HeaderPosition::findLogColumn(s_.headerText, s_.positionText);
+    logColumnKnown_ = column.found;
+    if (column.found) {
+        s_.logColumnStart = column.start;
+        s_.logColumnWidth = column.width;
+    }
+}
+
+void ReadingCommands::cmdStopCurrentData_Click() {
+    const MainControls& c = w_.controls();
+    c.tmrRealTime->stop();
+    c.tmrLong->stop();
+    c.tmrDisplayInterval->stop();
+    s_.runActive = false;
+    const bool listening = listen_->isListening();
+    if (c.mnuLog->isChecked() || c.mnuListen->isChecked()) {
+        s_.stopRequested = true;
+        try {
+            w_.serial().setOption(SerialLine::kOptionPurge, 100);
+        } catch (const std::exception&) {
+            // The "Z" below finds out whether the port is still there.
+        }
+        w_.exchange().SerialWrite(QStringLiteral("Z"));
+    }
+    listen_->stopListening();
+    MainWindow::setLeftTwips(c.cmdStopCurrentData, 3390);
+    w_.EnableCommandsAfterRun();
+    w_.workspace().ApplyDataConversions();
+    if (c.mnuRealTime->isChecked())
+        Settings::SaveSettings(s_, w_.prompts());
+    if (listening)
+        listen_->afterStop();
+    // "Z" could not be written: the port has gone.
+    if (s_.abortRequested)
+        w_.exchange().ShowCommError();
+}

@@ -1,0 +1,127 @@
+#include "readings/ListenMode.h"
+
+#include "link/Exchange.h"
+#include "link/SerialLine.h"
+#include "readings/ReplyWords.h"
+#include "readings/WorkspaceLines.h"
+#include "shell/MainWindow.h"
+#include "workspace/WorkspaceCommands.h"
+
+#include <QAction>
+#include <QLabel>
+#include <QPlainTextEdit>
+#include <QPushButton>
+
+namespace {
+constexpr int kStopLeftWhileListening = 2550; // the place of cmdListen
+constexpr int kStopLeft = 3390;
+} // namespace
+
+ListenMode::ListenMode(MainWindow& window) : QObject(&window), w_(window), s_(window.state()) {}
+
+void ListenMode::ListenForData() {
+    const MainControls& c = w_.controls();
+    w_.StopVoltageDisplay();
+    w_.PromptSaveAndClear(QStringLiteral("Listen"));
+    const bool continueListening = c.mnuListen->isChecked();
+    w_.UncheckDisplayMenus();
+    MainWindow::setLeftTwips(c.cmdStopCurrentData, kStopLeftWhileListening);
+    w_.DisableCommandsForRun();
+    c.cmdListen->hide();
+    if (!continueListening) {
+        c.RichTextBox1->clear();
+        s_.workspaceText.clear();
+    }
+    c.mnuListen->setChecked(true);
+    w_.setMessage(QStringLiteral("Listening  for  data  on  ") + s_.portName +
+                  QStringLiteral("  at  ") + QString::number(s_.baudRate) +
+                  QStringLiteral("  baud ..."));
+    s_.runActive = true;
+    s_.workspaceSaved = false;
+
+    w_.exchange().FlushInput();
+    if (s_.abortRequested) {
+        fail();
+        return;
+    }
+    line_.clear();
+    listening_ = true;
+    SerialLine& port = w_.serial();
+    bytesConnection_ = connect(&port, &SerialLine::bytesArrived, this, &ListenMode::onBytesArrived);
+    failConnection_ = connect(&port, &SerialLine::failed, this, &ListenMode::onPortFailed);
+    // Bytes that came between the drain and the connection are taken now.
+    onBytesArrived();
+}
+
+void ListenMode::onBytesArrived() {
+    // Reading the port can emit bytesArrived again from inside the read; the outer loop
+    // takes those bytes.
+    if (!listening_ || reading_)
+        return;
+    reading_ = true;
+    try {
+        SerialLine& port = w_.serial();
+        while (listening_) {
+            const int c = port.readByte();
+            if (c > 0) {
+                line_.append(QChar(char16_t(c)));
+                if (c == 13 || line_.size() >= kMaxLineLength) {
+                    const QString line = line_;
+                    line_.clear();
+                    takeLine(line);
+                }
+                continue;
+            }
+            // A NUL byte also reads as 0: go on while bytes are waiting.
+            if (!port.waitForByte(0))
+                break;
+        }
+    } catch (const std::exception&) {
+        reading_ = false;
+        if (listening_)
+            fail();
+        return;
+    }
+    reading_ = false;
+}
+
+void ListenMode::takeLine(const QString& line) {
+    s_.dataLine = line;
+    if (replywords::hasAny(line, {"ENDS", "BUSY", "EXIT", "ERROR"}))
+        return;
+    WorkspaceLines::append(s_, w_.controls().RichTextBox1, line);
+}
+
+void ListenMode::stopListening() {
+    if (!listening_)
+        return;
+    listening_ = false;
+    disconnect(bytesConnection_);
+    disconnect(failConnection_);
+    line_.clear();
+}
+
+void ListenMode::afterStop() {
+    const MainControls& c = w_.controls();
+    if (c.RichTextBox1->document()->isEmpty())
+        c.mnuListen->setChecked(false);
+    w_.setMessage(QString());
+}
+
+void ListenMode::onPortFailed() {
+    if (listening_)
+        fail();
+}
+
+void ListenMode::fail() {
+    const MainControls& c = w_.controls();
+    stopListening();
+    s_.runActive = false;
+    c.mnuListen->setChecked(false);
+    // What arrived stays in the workspace; the commands come back before the link dialog
+    // resets the window, so Listen is shown again.
+    MainWindow::setLeftTwips(c.cmdStopCurrentData, kStopLeft);
+    w_.EnableCommandsAfterRun();
+    w_.workspace().ApplyDataConversions();
+    w_.exchange().ShowCommError();
+}
