@@ -1,8 +1,8 @@
 // Logged Data against the simulated meter: both protocols, Stop, failures.
 #include "ReadingsWindow.h"
 
-#include "support/DialogDriver.h"
 #include "readings/LogDownload.h"
+#include "support/DialogDriver.h"
 
 using namespace readingstest;
 
@@ -58,8 +58,8 @@ void LogDownloadTest::twoDigitYearAndConversions() {
     WindowFixture fx;
     fx.settings.set(QStringLiteral("mS"), QStringLiteral("1"));
     QVERIFY(fx.startDetected(QStringLiteral("k50")));
-    fx.meter->setLogRecords({"0001  1.413mS 25.0C 31/12/75 23:59:00\r",
-                             "0002  1.413mS 25.0C 01/01/76 00:00:00\r"});
+    fx.meter->setLogRecords(
+        {"0001  1.413mS 25.0C 31/12/75 23:59:00\r", "0002  1.413mS 25.0C 01/01/76 00:00:00\r"});
     fx.c().mnuLog->trigger();
     QCOMPARE(lines(fx.state().workspaceText),
              (QStringList{"31/12/2075  23:59:00 0001   1413uS 25.0C",

@@ -2,11 +2,13 @@
 
 // Helpers shared by the readings window tests (header only: each test is its own program).
 
-#include "support/WindowFixture.h"
 #include "readings/ReadingCommands.h"
+#include "support/DialogDriver.h"
+#include "support/WindowFixture.h"
 
 #include <QAction>
 #include <QLabel>
+#include <QLineEdit>
 #include <QMenu>
 #include <QPlainTextEdit>
 #include <QProgressBar>
@@ -50,6 +52,15 @@ inline bool commandsBack(WindowFixture& fx) {
     const MainControls& c = fx.c();
     return c.cmdStopCurrentData->isHidden() && c.cmdCurrentData->isVisible() &&
            c.cmdCurrentData->isEnabled() && c.mnuDisplay->isEnabled() && !fx.state().runActive;
+}
+
+// Presses Current Data and answers the interval dialog with entry.
+inline void startRealTime(WindowFixture& fx, const QString& entry) {
+    DialogDriver::whenModal(QStringLiteral("frmRealTimeInterval"), [entry](QWidget* d) {
+        d->findChild<QLineEdit*>(QStringLiteral("txtLogInterval"))->setText(entry);
+        DialogDriver::click(d, QStringLiteral("cmdOK"));
+    });
+    fx.c().cmdCurrentData->click();
 }
 
 } // namespace readingstest
