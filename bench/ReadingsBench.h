@@ -106,8 +106,8 @@ public:
         first.setValue(QStringLiteral("Settings/FirstRun"), QStringLiteral("False"));
         settings.sync();
         first.sync();
-        window = std::make_unique<MainWindow>(
-            MainWindowServices{&prompts, &clock, &serial, &dialogs});
+        window =
+            std::make_unique<MainWindow>(MainWindowServices{&prompts, &clock, &serial, &dialogs});
         window->endProgram = [] {};
         window->start();
         return waitFor([this] { return !window->state().modelCode.isEmpty(); }, 10000);

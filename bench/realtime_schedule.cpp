@@ -23,8 +23,7 @@ int main(int argc, char** argv) {
     s.logInterval = 1;
     s.runActive = true;
     b.window->readings().realTime().StartRealTimeRun();
-    if (!waitFor([&] { return s.lineCount >= readings || !s.runActive; },
-                 (readings + 10) * 1000)) {
+    if (!waitFor([&] { return s.lineCount >= readings || !s.runActive; }, (readings + 10) * 1000)) {
         std::fprintf(stderr, "run did not finish\n");
         return 2;
     }

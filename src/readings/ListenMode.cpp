@@ -17,7 +17,7 @@ constexpr int kStopLeftWhileListening = 2550; // the place of cmdListen
 constexpr int kStopLeft = 3390;
 } // namespace
 
-ListenMode::ListenMode(MainWindow& window) : QObject(&window), w_(window), s_(window.state()) {}
+ListenMode::ListenMode(MainWindow& window) : w_(window), s_(window.state()) {}
 
 void ListenMode::ListenForData() {
     const MainControls& c = w_.controls();

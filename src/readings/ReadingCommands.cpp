@@ -107,7 +107,9 @@ void ReadingCommands::cmdStopCurrentData_Click() {
     c.tmrLong->stop();
     c.tmrDisplayInterval->stop();
     s_.runActive = false;
+    // Nothing more is taken once Stop is pressed; a line without its CR is dropped.
     const bool listening = listen_->isListening();
+    listen_->stopListening();
     if (c.mnuLog->isChecked() || c.mnuListen->isChecked()) {
         s_.stopRequested = true;
         try {
@@ -117,7 +119,6 @@ void ReadingCommands::cmdStopCurrentData_Click() {
         }
         w_.exchange().SerialWrite(QStringLiteral("Z"));
     }
-    listen_->stopListening();
     MainWindow::setLeftTwips(c.cmdStopCurrentData, 3390);
     w_.EnableCommandsAfterRun();
     w_.workspace().ApplyDataConversions();
