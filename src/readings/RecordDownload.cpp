@@ -96,7 +96,10 @@ void RecordDownload::download(Kind kind) {
         w_.UncheckDisplayMenus();
         c.cmdSaveFile->setEnabled(true);
         c.mnuSave->setEnabled(true);
-        c.RichTextBox1->setPlainText(s_.workspaceText);
+        // The view was emptied before the download: an empty block leaves it unchanged, so
+        // no change rule takes Save away again.
+        if (c.RichTextBox1->toPlainText() != s_.workspaceText)
+            c.RichTextBox1->setPlainText(s_.workspaceText);
         c.mnuGLP->setChecked(true);
     } else {
         c.RichTextBox1->setPlainText(s_.workspaceText);
