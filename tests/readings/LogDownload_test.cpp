@@ -36,6 +36,9 @@ void LogDownloadTest::threeRecords() {
 
     fx.c().cmdLoggedData->click();
 
+    // The last acknowledgement may still be on its way to the meter.
+    QVERIFY(fx.meter->waitForReceived("AAAA", 1, 2000));
+    QTest::qWait(20);
     const QByteArray after = receivedAfter(*fx.meter, "?S\r");
     QCOMPARE(after.count("?L\r"), 1);
     QCOMPARE(receivedAfter(*fx.meter, "?L\r").count('A'), 4);
