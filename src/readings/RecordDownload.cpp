@@ -66,6 +66,11 @@ void RecordDownload::download(Kind kind) {
         while (s_.responseText.left(3) != QLatin1String("END")) {
             exchange.SendCommand();
             if (s_.abortRequested) {
+                // The lines that came before the link failed are shown and can be saved.
+                if (!text.isEmpty()) {
+                    s_.workspaceText = text;
+                    showBlock(kind);
+                }
                 showLinkError(kind);
                 return;
             }
@@ -91,8 +96,12 @@ void RecordDownload::download(Kind kind) {
         }
         s_.workspaceText = text;
     }
+    showBlock(kind);
+}
 
-    if (glp) {
+void RecordDownload::showBlock(Kind kind) {
+    const MainControls& c = w_.controls();
+    if (kind == Kind::Glp) {
         w_.UncheckDisplayMenus();
         c.cmdSaveFile->setEnabled(true);
         c.mnuSave->setEnabled(true);

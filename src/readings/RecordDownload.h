@@ -16,6 +16,8 @@ private:
     void download(Kind kind);
     // The link failed: max/min clears the status line first.
     void showLinkError(Kind kind);
+    // The finish of a download: the block in the view, its check mark, Save enabled.
+    void showBlock(Kind kind);
 
     MainWindow& w_;
     AppState& s_;
