@@ -61,5 +61,10 @@ int main(int argc, char** argv) {
                 static_cast<long long>(s.workspaceText.count(QLatin1Char('\r'))),
                 same ? "identical to what was sent" : "DIFFERENT from what was sent");
     b.window->readings().cmdStopCurrentData_Click();
+    const long long missing =
+        lines - static_cast<long long>(s.workspaceText.count(QLatin1Char('\r')));
+    std::printf("RESULT listen_idle_cpu_pct %.3f %% 1\n", idleShare);
+    std::printf("RESULT listen_burst_10000_missing_lines %lld lines 0\n", missing);
+    std::printf("RESULT listen_burst_10000_s %.2f s %.2f\n", took, wire * 1.05);
     return idleShare < 1.0 && same ? 0 : 1;
 }

@@ -6,6 +6,7 @@
 #include "readings/ReadingCommands.h"
 
 #include <QApplication>
+#include <cmath>
 #include <sys/prctl.h>
 
 using namespace readingsbench;
@@ -62,5 +63,9 @@ int main(int argc, char** argv) {
                 "bytes %.3f s, %+.2f %% (target within 5 %%), %d lines\n",
                 records, baud, paced.seconds, static_cast<long long>(paced.bytes), wire,
                 (paced.seconds - wire) / wire * 100.0, paced.lines);
+    std::printf("RESULT log_download_10000_s %.3f s 3\n", fast.seconds);
+    std::printf("RESULT log_download_per_record_us %.1f us 300\n", fast.seconds * 1e6 / records);
+    std::printf("RESULT log_download_38400_vs_wire_pct %.2f %% 5\n",
+                std::fabs(paced.seconds - wire) / wire * 100.0);
     return fast.lines == records && paced.lines == records ? 0 : 1;
 }

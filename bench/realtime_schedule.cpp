@@ -47,5 +47,7 @@ int main(int argc, char** argv) {
                 "second reading %+.2f ms, last %+.2f ms (target: every one within 20 ms, "
                 "no drift)\n",
                 readings, worst, sum / readings, second, last);
+    std::printf("RESULT realtime_worst_offset_ms %.2f ms 20\n", worst);
+    std::printf("RESULT realtime_last_offset_ms %.2f ms 20\n", std::fabs(last));
     return worst <= 20.0 ? 0 : 1;
 }
