@@ -59,6 +59,10 @@ void ListenMode::onBytesArrived() {
     if (!listening_ || reading_)
         return;
     reading_ = true;
+    // The lines completed by the bytes waiting now go into the workspace together: one change
+    // of the view per batch instead of one per line when a meter prints fast.
+    QString batch;
+    bool failed = false;
     try {
         SerialLine& port = w_.serial();
         while (listening_) {
@@ -66,9 +70,10 @@ void ListenMode::onBytesArrived() {
             if (c > 0) {
                 line_.append(QChar(char16_t(c)));
                 if (c == 13 || line_.size() >= kMaxLineLength) {
-                    const QString line = line_;
+                    s_.dataLine = line_;
+                    if (!replywords::hasAny(line_, {"ENDS", "BUSY", "EXIT", "ERROR"}))
+                        batch += line_;
                     line_.clear();
-                    takeLine(line);
                 }
                 continue;
             }
@@ -77,19 +82,13 @@ void ListenMode::onBytesArrived() {
                 break;
         }
     } catch (const std::exception&) {
-        reading_ = false;
-        if (listening_)
-            fail();
-        return;
+        failed = true;
     }
     reading_ = false;
-}
-
-void ListenMode::takeLine(const QString& line) {
-    s_.dataLine = line;
-    if (replywords::hasAny(line, {"ENDS", "BUSY", "EXIT", "ERROR"}))
-        return;
-    WorkspaceLines::append(s_, w_.controls().RichTextBox1, line);
+    if (!batch.isEmpty())
+        WorkspaceLines::append(s_, w_.controls().RichTextBox1, batch);
+    if (failed && listening_)
+        fail();
 }
 
 void ListenMode::stopListening() {

@@ -28,7 +28,6 @@ public:
 private:
     void onBytesArrived();
     void onPortFailed();
-    void takeLine(const QString& line);
     // The port failed while listening: listening ends with the link dialog.
     void fail();
 

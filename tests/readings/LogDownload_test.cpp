@@ -21,6 +21,8 @@ private slots:
     void meterVanishes();
     void recordTooShort();
     void exitReplyWaitsForStop();
+    void percentLinesUnchangedHeaderShown();
+    void k5Layout();
 };
 
 void LogDownloadTest::threeRecords() {
@@ -198,6 +200,32 @@ void LogDownloadTest::exitReplyWaitsForStop() {
     QCOMPARE(lines(fx.c().RichTextBox1->toPlainText()),
              QStringList{"12/03/2004 10:15:00 0001   1.413mS 25.0C"});
     QVERIFY(commandsBack(fx));
+}
+
+void LogDownloadTest::percentLinesUnchangedHeaderShown() {
+    WindowFixture fx;
+    QVERIFY(fx.startDetected(QStringLiteral("percent-log")));
+    const QList<QByteArray> log = metersim::Meter::generateLog(fx.meter->profile(), 4);
+    fx.meter->setLogRecords(log);
+    fx.c().cmdLoggedData->click();
+    QString expected;
+    for (const QByteArray& record : log)
+        expected += QString::fromLatin1(record) + QLatin1Char('\n');
+    QCOMPARE(fx.state().workspaceText, expected);
+    QCOMPARE(fx.c().lblHeader->text(), fx.state().headerText);
+    QVERIFY(fx.state().headerText.contains(QStringLiteral("Log#")));
+    // CR LF is one line break in the view.
+    QCOMPARE(lines(fx.c().RichTextBox1->toPlainText()).size(), 4);
+}
+
+void LogDownloadTest::k5Layout() {
+    WindowFixture fx;
+    QVERIFY(fx.startDetected(QStringLiteral("k5ac")));
+    fx.meter->setLogRecords(
+        {"0001  1.413mS 25.0C 12/03 10:15\r", "0002  0*950ppK 25.0C 12/03 10:16\r"});
+    fx.c().cmdLoggedData->click();
+    QCOMPARE(lines(fx.state().workspaceText),
+             (QStringList{"12/03 10:15 0001  1.413mS 25.0C", "12/03 10:16 0002  0*950ppK 25.0C"}));
 }
 
 QTEST_MAIN(LogDownloadTest)

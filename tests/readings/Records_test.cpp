@@ -14,6 +14,7 @@ private slots:
     void endsEndsAndLowerCaseDoesNot();
     void noLinesBeforeEnd();
     void busyLineEndsGlp();
+    void exitLineEndsMaxMin();
     void headerWithLog();
     void headerWithoutLog();
     void headerWithoutLogColumn();
@@ -87,6 +88,20 @@ void RecordsTest::busyLineEndsGlp() {
     QVERIFY(fx.prompts.saw(QStringLiteral("User has terminated this process.")));
     QVERIFY(fx.c().RichTextBox1->toPlainText().isEmpty());
     QVERIFY(!fx.c().mnuGLP->isChecked());
+}
+
+void RecordsTest::exitLineEndsMaxMin() {
+    WindowFixture fx;
+    QVERIFY(fx.startDetected(QStringLiteral("qr34")));
+    fx.state().workspaceText = QStringLiteral("shown before\n");
+    fx.c().RichTextBox1->setPlainText(fx.state().workspaceText);
+    fx.meter->setRecordLines("?M", {"MAX 1\r", "EXIT\r", "MIN 2\r"});
+    fx.c().cmdMaxMin->click();
+    // Max/min clears its status line and leaves the workspace as it was.
+    QCOMPARE(fx.c().lblMessage->text(), QString());
+    QCOMPARE(fx.c().RichTextBox1->toPlainText(), QStringLiteral("shown before\n"));
+    QCOMPARE(fx.state().workspaceText, QStringLiteral("shown before\n"));
+    QVERIFY(!fx.c().mnuMaxMin->isChecked());
 }
 
 void RecordsTest::headerWithLog() {
