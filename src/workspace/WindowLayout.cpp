@@ -25,7 +25,10 @@ void WindowLayout::apply() {
 
     const MainControls& c = w_.controls();
     const AppState& s = w_.state();
-    int workspaceHeight = height - (s.isK5Family ? 3530 : 2510);
+    // A second row of buttons (K5 power, or a percent meter's stirrer and logging buttons) sits
+    // above the workspace and takes the same room as the status display gave it.
+    const bool secondRow = s.isK5Family || (s.percentFormat && (s.canStir || s.canAutoLog));
+    int workspaceHeight = height - (secondRow ? 3530 : 2510);
     if (s.percentFormat)
         workspaceHeight -= 340;
     c.RichTextBox1->resize(qMax(0, twipsToPixels(width - 60)),

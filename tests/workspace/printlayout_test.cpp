@@ -121,18 +121,22 @@ private slots:
     void workspaceFollowsWindow_data() {
         QTest::addColumn<bool>("k5");
         QTest::addColumn<bool>("percent");
+        QTest::addColumn<bool>("stir");
         QTest::addColumn<int>("less");
-        QTest::newRow("plain") << false << false << 2510;
-        QTest::newRow("K5 family") << true << false << 3530;
-        QTest::newRow("percent") << false << true << 2850;
-        QTest::newRow("K5 and percent") << true << true << 3870;
+        QTest::newRow("plain") << false << false << false << 2510;
+        QTest::newRow("K5 family") << true << false << false << 3530;
+        QTest::newRow("percent") << false << true << false << 2850;
+        QTest::newRow("percent with stirrer") << false << true << true << 3870;
+        QTest::newRow("K5 and percent") << true << true << false << 3870;
     }
     void workspaceFollowsWindow() {
         QFETCH(bool, k5);
         QFETCH(bool, percent);
+        QFETCH(bool, stir);
         QFETCH(int, less);
         ws->state().isK5Family = k5;
         ws->state().percentFormat = percent;
+        ws->state().canStir = stir;
         resizeTo(880, 690);
         QCOMPARE(ws->edit()->width(), twipsToPixels(W() - 60));
         QCOMPARE(ws->edit()->height(), twipsToPixels(H() - less));
