@@ -81,6 +81,14 @@ inline double cpuSeconds() {
            double(u.ru_utime.tv_usec + u.ru_stime.tv_usec) / 1e6;
 }
 
+// Processor time of the calling thread only (the program's own thread, not the meter's).
+inline double threadCpuSeconds() {
+    rusage u{};
+    getrusage(RUSAGE_THREAD, &u);
+    return double(u.ru_utime.tv_sec + u.ru_stime.tv_sec) +
+           double(u.ru_utime.tv_usec + u.ru_stime.tv_usec) / 1e6;
+}
+
 inline double peakMegabytes() {
     rusage u{};
     getrusage(RUSAGE_SELF, &u);

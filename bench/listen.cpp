@@ -47,17 +47,20 @@ int main(int argc, char** argv) {
     QElapsedTimer t;
     t.start();
     const double burstCpu0 = cpuSeconds();
+    const double burstThread0 = threadCpuSeconds();
     b.meter->sendUnsolicited(burst);
     const double wire = double(burst.size()) * 10.0 / baud;
     const bool whole = waitFor([&] { return s.workspaceText.size() >= expected.size(); },
                                int(wire * 3000) + 30000);
     const double took = t.nsecsElapsed() / 1e9;
     const double burstCpu = cpuSeconds() - burstCpu0;
+    const double burstThread = threadCpuSeconds() - burstThread0;
     const bool same = s.workspaceText == expected;
     std::printf("listen, burst of %d lines (%lld bytes) at %d baud: %s in %.2f s "
-                "(wire time %.2f s, %.2f s of processor time), %lld lines taken, %s\n",
+                "(wire time %.2f s; processor time %.2f s, of which the program's thread %.2f s), "
+                "%lld lines taken, %s\n",
                 lines, static_cast<long long>(burst.size()), baud,
-                whole ? "arrived" : "DID NOT ARRIVE", took, wire, burstCpu,
+                whole ? "arrived" : "DID NOT ARRIVE", took, wire, burstCpu, burstThread,
                 static_cast<long long>(s.workspaceText.count(QLatin1Char('\r'))),
                 same ? "identical to what was sent" : "DIFFERENT from what was sent");
     b.window->readings().cmdStopCurrentData_Click();
