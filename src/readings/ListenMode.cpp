@@ -65,7 +65,14 @@ void ListenMode::onBytesArrived() {
     bool failed = false;
     try {
         SerialLine& port = w_.serial();
+        int taken = 0;
         while (listening_) {
+            // A meter that never pauses must not keep the window from its events (and the
+            // user from Stop): after a good portion the rest is taken on the next turn.
+            if (++taken > kBytesPerTurn) {
+                QMetaObject::invokeMethod(this, &ListenMode::onBytesArrived, Qt::QueuedConnection);
+                break;
+            }
             const int c = port.readByte();
             if (c > 0) {
                 line_.append(QChar(char16_t(c)));

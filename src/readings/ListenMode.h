@@ -24,6 +24,8 @@ public:
 
     // Longest line kept; a meter that never sends CR cannot grow it further.
     static constexpr int kMaxLineLength = 4096;
+    // Bytes taken in one turn of the event loop.
+    static constexpr int kBytesPerTurn = 65536;
 
 private:
     void onBytesArrived();

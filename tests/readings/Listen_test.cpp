@@ -19,6 +19,7 @@ private slots:
     void nothingReceived();
     void portGone();
     void nulBytesDoNotStall();
+    void endlessPrintingStillStops();
 
 private:
     bool waitForText(WindowFixture& fx, const QString& text) {
@@ -155,6 +156,24 @@ void ListenTest::nulBytesDoNotStall() {
     fx.meter->sendUnsolicited(QByteArray("a\0\0b\r", 5));
     QVERIFY(waitForText(fx, QStringLiteral("ab\r")));
     fx.c().cmdStopCurrentData->click();
+}
+
+void ListenTest::endlessPrintingStillStops() {
+    WindowFixture fx;
+    QVERIFY(fx.startDetected(QStringLiteral("plain")));
+    fx.c().cmdListen->click();
+    fx.meter->startEndlessSending();
+    // The window keeps handling its events while the meter never pauses.
+    QVERIFY(fx.waitUntil([&] { return fx.state().workspaceText.count(QLatin1Char('\r')) > 200; },
+                         5000));
+    fx.c().cmdStopCurrentData->click();
+    fx.meter->stopEndlessSending();
+    QVERIFY(commandsBack(fx));
+    QVERIFY(!fx.window->readings().listen().isListening());
+    const QString text = fx.state().workspaceText;
+    QVERIFY(text.endsWith(QLatin1Char('\r')));
+    QTest::qWait(100);
+    QCOMPARE(fx.state().workspaceText, text);
 }
 
 QTEST_MAIN(ListenTest)
