@@ -82,111 +82,38 @@ void StatusDisplayTest::profiles_data() {
                             "cmdStopStirring",  "cmdK5On",           "cmdK5Off",
                             "cmdLoggedData",    "cmdEraseLog"};
     const QStringList logMenus = {"mnuLog", "mnuEraseLog"};
-
-    QTest::newRow("plain") << "plain"
-                           << "CD200"
-                           << "V1.21"
-                           << "012345"
-                           << "3"
-                           << "CD200" << logGlp << logGlpMenus << 7590 << false;
-    QTest::newRow("k50") << "k50"
-                         << "K50"
-                         << "V2.10"
-                         << "023456"
-                         << "3"
-                         << "K50" << logGlp << logGlpMenus << 7590 << false;
-    QTest::newRow("k50v3") << "k50v3"
-                           << "K50V3"
-                           << "V3.00"
-                           << "034567"
-                           << "3"
-                           << "K50V3" << logGlp << logGlpMenus << 7590 << false;
-    QTest::newRow("lxt") << "lxt"
-                         << "LXT200"
-                         << "V1.05"
-                         << "045678"
-                         << "3"
-                         << "LXT200" << logGlp << logGlpMenus << 7590 << false;
-    QTest::newRow("k51") << "k51"
-                         << "K51"
-                         << "V1.00"
-                         << "056789"
-                         << ""
-                         << "K51" << QStringList() << QStringList() << 5070 << false;
-    QTest::newRow("k5ac") << "k5ac"
-                          << "K5AC"
-                          << ""
-                          << ""
-                          << "3"
-                          << "K5AC" << k5 << logMenus << 6750 << false;
-    QTest::newRow("k5acmv") << "k5acmv"
-                            << "K5ACMV"
-                            << ""
-                            << ""
-                            << "3"
-                            << "K5ACMV" << k5 << logMenus << 6750 << false;
-    QTest::newRow("k5ad") << "k5ad"
-                          << "K5ACMV"
-                          << ""
-                          << ""
-                          << "3"
-                          << "K5ACMV"
-                          << QStringList{"cmdEnableLogging", "cmdDisableLogging", "cmdK5On",
-                                         "cmdK5Off",         "cmdLoggedData",     "cmdEraseLog"}
-                          << logMenus << 6750 << false;
-    QTest::newRow("k5gj") << "k5gj"
-                          << "K5GJ"
-                          << ""
-                          << ""
-                          << "3"
-                          << "K5GJ" << k5 << logMenus << 6750 << false;
-    QTest::newRow("k5ah") << "k5ah"
-                          << "K5AH"
-                          << ""
-                          << "51234"
-                          << "3"
-                          << "K5AH" << (k5 + QStringList{"cmdGLPData"})
-                          << QStringList{"mnuLog", "mnuGLP", "mnuEraseLog"} << 7590 << false;
-    QTest::newRow("percent-log") << "percent-log"
-                                 << "CP600"
-                                 << "V2.01"
-                                 << "067890"
-                                 << "3"
-                                 << "CP600" << QStringList{"cmdEnableLogging", "cmdDisableLogging",
-                                                           "cmdStartStirring", "cmdStopStirring",
-                                                           "cmdLoggedData",    "cmdEraseLog"}
-                                 << QStringList{"mnuLog", "mnuVoltage", "mnuEraseLog"} << 6750
-                                 << true;
-    QTest::newRow("percent-nolog")
-        << "percent-nolog"
-        << "CP500"
-        << "V1.10"
-        << "078901"
-        << ""
-        << "CP500" << QStringList() << QStringList{"mnuVoltage"} << 5070 << true;
-    QTest::newRow("qr32") << "qr32"
-                          << "QR32"
-                          << "2.1"
-                          << "A12345"
-                          << "3"
-                          << "QR32" << QStringList{"cmdLoggedData", "cmdEraseLog"} << logMenus
-                          << 6750 << false;
-    QTest::newRow("zum410") << "zum410"
-                            << "QR32"
-                            << "2.1"
-                            << "A12345"
-                            << "3"
-                            << "QR32" << QStringList{"cmdLoggedData", "cmdEraseLog"} << logMenus
-                            << 6750 << false;
-    QTest::newRow("qr34") << "qr34"
-                          << "QR34A"
-                          << "V1.40"
-                          << "089012"
-                          << "3"
-                          << "QR34"
-                          << QStringList{"cmdLoggedData", "cmdEraseLog", "cmdGLPData", "cmdMaxMin"}
-                          << QStringList{"mnuLog", "mnuGLP", "mnuMaxMin", "mnuEraseLog"} << 7590
-                          << false;
+    // Fields: profile, model, version, serial, logged count, model code.
+    auto row = [](const QStringList& f, const QStringList& buttons, const QStringList& menus,
+                  int helpLeft, bool header = false) {
+        QTest::newRow(qPrintable(f[0])) << f[0] << f[1] << f[2] << f[3] << f[4] << f[5] << buttons
+                                        << menus << helpLeft << header;
+    };
+    row({"plain", "CD200", "V1.21", "012345", "3", "CD200"}, logGlp, logGlpMenus, 7590);
+    row({"k50", "K50", "V2.10", "023456", "3", "K50"}, logGlp, logGlpMenus, 7590);
+    row({"k50v3", "K50V3", "V3.00", "034567", "3", "K50V3"}, logGlp, logGlpMenus, 7590);
+    row({"lxt", "LXT200", "V1.05", "045678", "3", "LXT200"}, logGlp, logGlpMenus, 7590);
+    row({"k51", "K51", "V1.00", "056789", "", "K51"}, {}, {}, 5070);
+    row({"k5ac", "K5AC", "", "", "3", "K5AC"}, k5, logMenus, 6750);
+    row({"k5acmv", "K5ACMV", "", "", "3", "K5ACMV"}, k5, logMenus, 6750);
+    row({"k5ad", "K5ACMV", "", "", "3", "K5ACMV"},
+        {"cmdEnableLogging", "cmdDisableLogging", "cmdK5On", "cmdK5Off", "cmdLoggedData",
+         "cmdEraseLog"},
+        logMenus, 6750);
+    row({"k5gj", "K5GJ", "", "", "3", "K5GJ"}, k5, logMenus, 6750);
+    row({"k5ah", "K5AH", "", "51234", "3", "K5AH"}, k5 + QStringList{"cmdGLPData"}, logGlpMenus,
+        7590);
+    row({"percent-log", "CP600", "V2.01", "067890", "3", "CP600"},
+        {"cmdEnableLogging", "cmdDisableLogging", "cmdStartStirring", "cmdStopStirring",
+         "cmdLoggedData", "cmdEraseLog"},
+        {"mnuLog", "mnuVoltage", "mnuEraseLog"}, 6750, true);
+    row({"percent-nolog", "CP500", "V1.10", "078901", "", "CP500"}, {}, {"mnuVoltage"}, 5070, true);
+    row({"qr32", "QR32", "2.1", "A12345", "3", "QR32"}, {"cmdLoggedData", "cmdEraseLog"}, logMenus,
+        6750);
+    row({"zum410", "QR32", "2.1", "A12345", "3", "QR32"}, {"cmdLoggedData", "cmdEraseLog"},
+        logMenus, 6750);
+    row({"qr34", "QR34A", "V1.40", "089012", "3", "QR34"},
+        {"cmdLoggedData", "cmdEraseLog", "cmdGLPData", "cmdMaxMin"},
+        {"mnuLog", "mnuGLP", "mnuMaxMin", "mnuEraseLog"}, 7590);
 }
 
 void StatusDisplayTest::profiles() {
