@@ -51,24 +51,13 @@ class MeterTest : public QObject {
 private slots:
     void statusPerProfile_data();
     void statusPerProfile();
-    void unknownProfileThrows();
-    void secondStatusOfQr32();
-    void busyCountThenStatus();
     void scriptedRepliesAndFaults();
     void logWithAcksThenEnds();
-    void eraseEmptiesLogAndStatus();
-    void qr32RecordsWithoutAcks();
-    void glpBlockPerLineFeed();
     void percentHeaderMatchesPositions();
     void logLayouts_data();
     void logLayouts();
     void vanishGivesPortError();
-    void vanishMidTransfer();
     void recordsReceivedBytes();
-    void pacingSlowsReplies();
-    void endlessSendingUntilStopped();
-    void qr32VanishMidTransfer();
-    void powerOffSleepsUntilWakeUp();
 };
 
 void MeterTest::statusPerProfile_data() {
@@ -95,33 +84,6 @@ void MeterTest::statusPerProfile() {
     QVERIFY(port.opened);
     QCOMPARE(port.exchange(kWakeUp), status);
     QCOMPARE(port.exchange("?S\r"), status);
-}
-
-void MeterTest::unknownProfileThrows() {
-    QVERIFY_THROWS_EXCEPTION(std::invalid_argument, metersim::profile("k99"));
-    for (const QString& name : metersim::profileNames())
-        QCOMPARE(metersim::profile(name).name, name);
-}
-
-void MeterTest::secondStatusOfQr32() {
-    Meter meter(metersim::profile("qr32"));
-    QVERIFY(meter.start());
-    Port port(meter.portPath());
-    const QByteArray w = port.exchange("?W\r");
-    QCOMPARE(w.mid(8, 3), QByteArray("2.1"));
-    QCOMPARE(w.mid(12, 6), QByteArray("A12345"));
-    QCOMPARE(port.exchange("?L\r"), QByteArray("ERROR\r"));
-}
-
-void MeterTest::busyCountThenStatus() {
-    Meter meter(metersim::profile("k5ac"));
-    QVERIFY(meter.start());
-    meter.setBusyCount(2);
-    Port port(meter.portPath());
-    QCOMPARE(port.exchange("?S\r"), QByteArray("BUSY\r"));
-    QCOMPARE(port.exchange("?S\r"), QByteArray("BUSY\r"));
-    QCOMPARE(port.exchange("?S\r"), QByteArray("K5AC 0003 +m\r"));
-    QCOMPARE(meter.count("?S\r"), 3);
 }
 
 void MeterTest::scriptedRepliesAndFaults() {
@@ -170,48 +132,6 @@ void MeterTest::logWithAcksThenEnds() {
     QCOMPARE(port.exchange("?L\r"), log.at(0));
     QCOMPARE(port.exchange("Z", 150), QByteArray());
     QCOMPARE(port.exchange("A", 150), QByteArray());
-}
-
-void MeterTest::eraseEmptiesLogAndStatus() {
-    Meter meter(metersim::profile("percent-log"));
-    QVERIFY(meter.start());
-    Port port(meter.portPath());
-    QCOMPARE(port.exchange("?E\r"), QByteArray("ERASED\r"));
-    QCOMPARE(port.exchange("?S\r"), QByteArray("CP600 V2.01 067890 0000 +mv%g\r"));
-    QCOMPARE(port.exchange("?L\r"), QByteArray("ENDS\r"));
-    meter.setLogRecords(Meter::generateLog(meter.profile(), 42));
-    QCOMPARE(port.exchange("?S\r"), QByteArray("CP600 V2.01 067890 0042 +mv%g\r"));
-}
-
-void MeterTest::qr32RecordsWithoutAcks() {
-    Meter meter(metersim::profile("qr32"));
-    QVERIFY(meter.start());
-    meter.setLogRecords(Meter::generateLog(meter.profile(), 5));
-    Port port(meter.portPath());
-    port.write("?R\r");
-    for (int i = 0; i < 5; ++i)
-        QCOMPARE(port.readLine().size(), 37);
-    QCOMPARE(port.readLine(150), QByteArray());
-}
-
-void MeterTest::glpBlockPerLineFeed() {
-    Meter meter(metersim::profile("k5ac"));
-    QVERIFY(meter.start());
-    Port port(meter.portPath());
-    // Without GLP records "?G" enables logging.
-    QCOMPARE(port.exchange("?G\r"), QByteArray("LOG START\r"));
-    meter.setRecordLines("?G", {"one\r", "two\r"});
-    QCOMPARE(port.exchange("?G\r"), QByteArray("one\r"));
-    QCOMPARE(port.exchange("\n"), QByteArray("two\r"));
-    QCOMPARE(port.exchange("\n"), QByteArray("END\r"));
-    QCOMPARE(port.exchange("\n", 150), QByteArray());
-    Meter qr34(metersim::profile("qr34"));
-    QVERIFY(qr34.start());
-    Port port34(qr34.portPath());
-    QVERIFY(port34.exchange("?M\r").startsWith("MAX"));
-    QVERIFY(port34.exchange("\n").startsWith("MIN"));
-    QCOMPARE(port34.exchange("\n"), QByteArray("END\r"));
-    QCOMPARE(port.exchange("?M\r"), QByteArray("SON\r"));
 }
 
 void MeterTest::percentHeaderMatchesPositions() {
@@ -283,19 +203,6 @@ void MeterTest::vanishGivesPortError() {
     QVERIFY(!again.open(QIODevice::ReadWrite));
 }
 
-void MeterTest::vanishMidTransfer() {
-    Meter meter(metersim::profile("k5ah"));
-    QVERIFY(meter.start());
-    meter.setLogRecords(Meter::generateLog(meter.profile(), 10));
-    meter.vanishAfterSending(2);
-    Port port(meter.portPath());
-    QVERIFY(!port.exchange("?L\r").isEmpty());
-    QVERIFY(!port.exchange("A").isEmpty());
-    QCOMPARE(port.exchange("A", 300), QByteArray());
-    QVERIFY(meter.waitForReceived("A", 2, 500));
-    QTRY_VERIFY_WITH_TIMEOUT(meter.hasVanished(), 1000);
-}
-
 void MeterTest::recordsReceivedBytes() {
     Meter meter(metersim::profile("lxt"));
     QVERIFY(meter.start());
@@ -316,55 +223,6 @@ void MeterTest::recordsReceivedBytes() {
     QVERIFY(!meter.waitForReceived("?Q", 1, 50));
     meter.clearReceived();
     QCOMPARE(meter.count("?"), 0);
-}
-
-void MeterTest::pacingSlowsReplies() {
-    Meter meter(metersim::profile("qr32"));
-    QVERIFY(meter.start());
-    meter.setBaud(1200);
-    Port port(meter.portPath());
-    QElapsedTimer timer;
-    timer.start();
-    // 11 bytes at 1200 baud take at least 90 ms.
-    QCOMPARE(port.exchange("?S\r"), QByteArray("QR32 0003 \r"));
-    QVERIFY(timer.elapsed() >= 80);
-}
-
-void MeterTest::endlessSendingUntilStopped() {
-    Meter meter(metersim::profile("plain"));
-    QVERIFY(meter.start());
-    Port port(meter.portPath());
-    meter.startEndlessSending();
-    for (int i = 0; i < 50; ++i)
-        QVERIFY(port.readLine().endsWith('\r'));
-    meter.stopEndlessSending();
-    // Whatever was already queued drains, then the line goes quiet.
-    while (!port.readLine(200).isEmpty()) {
-    }
-    QCOMPARE(port.exchange("?S\r"), QByteArray("CD200 V1.21 012345 0003\r"));
-}
-
-void MeterTest::qr32VanishMidTransfer() {
-    Meter meter(metersim::profile("zum410"));
-    QVERIFY(meter.start());
-    meter.setLogRecords(Meter::generateLog(meter.profile(), 10000));
-    meter.vanishAfterSending(3);
-    Port port(meter.portPath());
-    QCOMPARE(port.exchange("?S\r"), QByteArray("ZUM410 10000 \r"));
-    port.write("?R\r");
-    for (int i = 0; i < 3; ++i)
-        QCOMPARE(port.readLine().size(), 37);
-    QTRY_VERIFY_WITH_TIMEOUT(meter.hasVanished(), 1000);
-    QCOMPARE(port.readLine(200), QByteArray());
-}
-
-void MeterTest::powerOffSleepsUntilWakeUp() {
-    Meter meter(metersim::profile("k5gj"));
-    QVERIFY(meter.start());
-    Port port(meter.portPath());
-    QCOMPARE(port.exchange("?K\r"), QByteArray("SSD\r"));
-    QCOMPARE(port.exchange("?S\r", 200), QByteArray());
-    QCOMPARE(port.exchange(kWakeUp), QByteArray("K5GJ 0003 +m\r"));
 }
 
 QTEST_GUILESS_MAIN(MeterTest)
