@@ -45,144 +45,81 @@ void StatusReplyTest::fields_data() {
     QTest::addColumn<QString>("serial");
     QTest::addColumn<int>("logged");
     QTest::addColumn<QString>("capabilities");
+    auto row = [](const char* tag, const QString& reply, const QString& current, Format format,
+                  const QString& model, const QString& version, const QString& serial, int logged,
+                  const QString& capabilities) {
+        QTest::newRow(tag) << reply << current << format << model << version << serial << logged
+                           << capabilities;
+    };
 
     // K5 family: count = first digit run from the third character on.
-    QTest::newRow("K5AC count and letters") << "K5AC 0012 +m\r"
-                                            << "" << Format::K5 << "K5AC"
-                                            << ""
-                                            << "" << 12 << "K5AC 0012 +m\r";
-    QTest::newRow("K5ACMV word") << "K5ACMVX 0001\r"
-                                 << "" << Format::K5 << "K5ACMV"
-                                 << ""
-                                 << "" << 1 << "K5ACMVX 0001\r";
-    QTest::newRow("K5GJ beats K5G") << "K5GJX 0005\r"
-                                    << "" << Format::K5 << "K5GJ"
-                                    << ""
-                                    << "" << 5 << "K5GJX 0005\r";
-    QTest::newRow("K5AD shown as K5ACMV") << "K5ADX 0007\r"
-                                          << "" << Format::K5 << "K5ACMV"
-                                          << ""
-                                          << "" << 7 << "K5ADX 0007\r";
+    row("K5AC count and letters", "K5AC 0012 +m\r", "", Format::K5, "K5AC", "", "", 12,
+        "K5AC 0012 +m\r");
+    row("K5ACMV word", "K5ACMVX 0001\r", "", Format::K5, "K5ACMV", "", "", 1, "K5ACMVX 0001\r");
+    row("K5GJ beats K5G", "K5GJX 0005\r", "", Format::K5, "K5GJ", "", "", 5, "K5GJX 0005\r");
+    row("K5AD shown as K5ACMV", "K5ADX 0007\r", "", Format::K5, "K5ACMV", "", "", 7,
+        "K5ADX 0007\r");
     // The count is the first digit run, even one inside the model word.
-    QTest::newRow("digit in model word") << "K5G2 0007\r"
-                                         << "" << Format::K5 << "K5G"
-                                         << ""
-                                         << "" << 2 << "K5G2 0007\r";
-    QTest::newRow("K5 unknown word kept") << "K5XYZ 3\r"
-                                          << "" << Format::K5 << "K5XYZ"
-                                          << ""
-                                          << "" << 3 << "K5XYZ 3\r";
-    QTest::newRow("K5AH serial") << "K5AH 0034 +m 12345\r"
-                                 << "" << Format::K5 << "K5AH"
-                                 << ""
-                                 << "12345" << 34 << "K5AH 0034 +m 12345\r";
-    QTest::newRow("K5 without CR") << "K5AC 0012 +m"
-                                   << "" << Format::K5 << "K5AC"
-                                   << ""
-                                   << "" << 12 << "K5AC 0012 +m";
-    QTest::newRow("K5 no digits") << "K5AC +m\r"
-                                  << "" << Format::K5 << "K5AC"
-                                  << ""
-                                  << "" << keepCount << "K5AC +m\r";
-    QTest::newRow("K5 count overflow") << "K5AC 99999999999 \r"
-                                       << "" << Format::K5 << "K5AC"
-                                       << ""
-                                       << "" << keepCount << "K5AC 99999999999 \r";
-    QTest::newRow("K5 no space keeps model") << "K5\r"
-                                             << "K5G" << Format::K5 << keep << ""
-                                             << "" << keepCount << "K5\r";
-    QTest::newRow("K5AH too short for serial") << "K5AH\r"
-                                               << "K5AH" << Format::K5 << keep << ""
-                                               << "" << keepCount << "K5AH\r";
+    row("digit in model word", "K5G2 0007\r", "", Format::K5, "K5G", "", "", 2, "K5G2 0007\r");
+    row("K5 unknown word kept", "K5XYZ 3\r", "", Format::K5, "K5XYZ", "", "", 3, "K5XYZ 3\r");
+    row("K5AH serial", "K5AH 0034 +m 12345\r", "", Format::K5, "K5AH", "", "12345", 34,
+        "K5AH 0034 +m 12345\r");
+    row("K5 without CR", "K5AC 0012 +m", "", Format::K5, "K5AC", "", "", 12, "K5AC 0012 +m");
+    row("K5 no digits", "K5AC +m\r", "", Format::K5, "K5AC", "", "", keepCount, "K5AC +m\r");
+    row("K5 count overflow", "K5AC 99999999999 \r", "", Format::K5, "K5AC", "", "", keepCount,
+        "K5AC 99999999999 \r");
+    row("K5 no space keeps model", "K5\r", "K5G", Format::K5, keep, "", "", keepCount, "K5\r");
+    row("K5AH too short for serial", "K5AH\r", "K5AH", Format::K5, keep, "", "", keepCount,
+        "K5AH\r");
 
     // Plain: count = four characters before the last one.
-    QTest::newRow("plain K50") << "K50 1.05 A1234 0012\r"
-                               << "" << Format::Plain << "K50"
-                               << "1.05"
-                               << "A1234" << 12 << "";
-    QTest::newRow("plain two spaces") << "K50  1.05  A1234  0012\r"
-                                      << "" << Format::Plain << "K50"
-                                      << "1.05"
-                                      << "A1234" << 12 << "";
-    QTest::newRow("plain K51 no count") << "K51 V1.2 SN0001 9999\r"
-                                        << "" << Format::Plain << "K51"
-                                        << "V1.2"
-                                        << "SN0001" << keepCount << "";
-    QTest::newRow("plain count not a number") << "K50 1.0 S1 00x2\r"
-                                              << "" << Format::Plain << "K50"
-                                              << "1.0"
-                                              << "S1" << keepCount << "";
-    QTest::newRow("plain serial ended by CR") << "K51 1.0 S1\r"
-                                              << "" << Format::Plain << "K51"
-                                              << "1.0"
-                                              << "S1" << keepCount << "";
-    QTest::newRow("plain serial without space") << "K51 1.0 S1"
-                                                << "" << Format::Plain << "K51"
-                                                << "1.0" << keep << keepCount << "";
-    QTest::newRow("plain too short")
-        << "K50\r"
-        << "OLD" << Format::Plain << keep << keep << keep << keepCount << "";
-    QTest::newRow("plain QR34 word") << "QR34X 2.0 S77 0005\r"
-                                     << "" << Format::Plain << "QR34X"
-                                     << "2.0"
-                                     << "S77" << 5 << "";
-    QTest::newRow("ZUM410 second word")
-        << "ZUM410 0042 \r"
-        << "" << Format::Plain << "QR32" << keep << keep << 42 << "";
-    QTest::newRow("QR32 second word") << "QR32 0100 xyz\r"
-                                      << "" << Format::Plain << "QR32" << keep << keep << 100 << "";
-    QTest::newRow("QR32 second word unclosed")
-        << "QR32 0100\r"
-        << "" << Format::Plain << "QR32" << keep << keep << keepCount << "";
-    QTest::newRow("high bytes") << latin1("K50 \xe9\xff"
-                                          "1 S\x80 0012\r")
-                                << "" << Format::Plain << "K50"
-                                << latin1("\xe9\xff"
-                                          "1")
-                                << latin1("S\x80") << 12 << "";
-    QTest::newRow("control characters") << latin1("K50 1.0\t\x01 S1 0012\r") << "" << Format::Plain
-                                        << "K50" << latin1("1.0\t\x01") << "S1" << 12 << "";
+    row("plain K50", "K50 1.05 A1234 0012\r", "", Format::Plain, "K50", "1.05", "A1234", 12, "");
+    row("plain two spaces", "K50  1.05  A1234  0012\r", "", Format::Plain, "K50", "1.05", "A1234",
+        12, "");
+    row("plain K51 no count", "K51 V1.2 SN0001 9999\r", "", Format::Plain, "K51", "V1.2", "SN0001",
+        keepCount, "");
+    row("plain count not a number", "K50 1.0 S1 00x2\r", "", Format::Plain, "K50", "1.0", "S1",
+        keepCount, "");
+    row("plain serial ended by CR", "K51 1.0 S1\r", "", Format::Plain, "K51", "1.0", "S1",
+        keepCount, "");
+    row("plain serial without space", "K51 1.0 S1", "", Format::Plain, "K51", "1.0", keep,
+        keepCount, "");
+    row("plain too short", "K50\r", "OLD", Format::Plain, keep, keep, keep, keepCount, "");
+    row("plain QR34 word", "QR34X 2.0 S77 0005\r", "", Format::Plain, "QR34X", "2.0", "S77", 5, "");
+    row("ZUM410 second word", "ZUM410 0042 \r", "", Format::Plain, "QR32", keep, keep, 42, "");
+    row("QR32 second word", "QR32 0100 xyz\r", "", Format::Plain, "QR32", keep, keep, 100, "");
+    row("QR32 second word unclosed", "QR32 0100\r", "", Format::Plain, "QR32", keep, keep,
+        keepCount, "");
+    row("high bytes",
+        latin1("K50 \xe9\xff"
+               "1 S\x80 0012\r"),
+        "", Format::Plain, "K50",
+        latin1("\xe9\xff"
+               "1"),
+        latin1("S\x80"), 12, "");
+    row("control characters", latin1("K50 1.0\t\x01 S1 0012\r"), "", Format::Plain, "K50",
+        latin1("1.0\t\x01"), "S1", 12, "");
 
     // Percent: exactly one space between fields, then letters, "%", one letter.
-    QTest::newRow("percent with log") << "P200 2.1 S2 0042 +v%g\r"
-                                      << "" << Format::Percent << "P200"
-                                      << "2.1"
-                                      << "S2" << 42 << "+v";
-    QTest::newRow("percent n: no count") << "P100 1.0 S1 +m%n\r"
-                                         << "" << Format::Percent << "P100"
-                                         << "1.0"
-                                         << "S1" << keepCount << "+m";
-    QTest::newRow("percent l: no count") << "P100 1.0 S1 9999 v%l\r"
-                                         << "" << Format::Percent << "P100"
-                                         << "1.0"
-                                         << "S1" << keepCount << "9999 v";
-    QTest::newRow("percent two spaces") << "P100  1.0 S1 0004 +%g\r"
-                                        << "" << Format::Percent << "P100"
-                                        << ""
-                                        << "1.0" << keepCount << "0004 +";
-    QTest::newRow("percent truncated")
-        << "P1%g"
-        << "OLD" << Format::Percent << keep << keep << keep << keepCount << "P1";
-    QTest::newRow("percent sign first")
-        << "%n\r"
-        << "" << Format::Percent << keep << keep << keep << keepCount << "";
-    QTest::newRow("percent only in a field") << "P1 1% S1 0003\r"
-                                             << "" << Format::Percent << "P1"
-                                             << "1%"
-                                             << "S1" << keepCount << "";
+    row("percent with log", "P200 2.1 S2 0042 +v%g\r", "", Format::Percent, "P200", "2.1", "S2", 42,
+        "+v");
+    row("percent n: no count", "P100 1.0 S1 +m%n\r", "", Format::Percent, "P100", "1.0", "S1",
+        keepCount, "+m");
+    row("percent l: no count", "P100 1.0 S1 9999 v%l\r", "", Format::Percent, "P100", "1.0", "S1",
+        keepCount, "9999 v");
+    row("percent two spaces", "P100  1.0 S1 0004 +%g\r", "", Format::Percent, "P100", "", "1.0",
+        keepCount, "0004 +");
+    row("percent truncated", "P1%g", "OLD", Format::Percent, keep, keep, keep, keepCount, "P1");
+    row("percent sign first", "%n\r", "", Format::Percent, keep, keep, keep, keepCount, "");
+    row("percent only in a field", "P1 1% S1 0003\r", "", Format::Percent, "P1", "1%", "S1",
+        keepCount, "");
 
     // Unusable and error replies change nothing.
-    QTest::newRow("busy") << "BUSY\r"
-                          << "" << Format::Unusable << keep << keep << keep << keepCount << "";
-    QTest::newRow("busy any case")
-        << "K50 busy\r"
-        << "" << Format::Unusable << keep << keep << keep << keepCount << "";
-    QTest::newRow("exit") << "EXIT\r"
-                          << "" << Format::Unusable << keep << keep << keep << keepCount << "";
-    QTest::newRow("empty") << ""
-                           << "" << Format::Unusable << keep << keep << keep << keepCount << "";
-    QTest::newRow("error") << "ERROR\r"
-                           << "" << Format::Error << keep << keep << keep << keepCount << "";
+    row("busy", "BUSY\r", "", Format::Unusable, keep, keep, keep, keepCount, "");
+    row("busy any case", "K50 busy\r", "", Format::Unusable, keep, keep, keep, keepCount, "");
+    row("exit", "EXIT\r", "", Format::Unusable, keep, keep, keep, keepCount, "");
+    row("empty", "", "", Format::Unusable, keep, keep, keep, keepCount, "");
+    row("error", "ERROR\r", "", Format::Error, keep, keep, keep, keepCount, "");
 }
 
 void StatusReplyTest::fields() {
@@ -208,57 +145,32 @@ void StatusReplyTest::flags_data() {
     QTest::addColumn<bool>("voltage");
     QTest::addColumn<bool>("batteryLow");
     QTest::addColumn<bool>("versionQuery");
+    // Flags in column order: k5, log, glp, autoLog, stir, voltage, batteryLow, versionQuery.
+    auto row = [](const char* tag, const QString& reply, const QString& current,
+                  const char* flags) {
+        auto& data = QTest::newRow(tag) << reply << current;
+        for (int i = 0; i < 8; ++i)
+            data << (flags[i] == '1');
+    };
 
-    QTest::newRow("K5AC") << "K5AC 0012 +m\r"
-                          << "" << true << true << false << true << true << false << false << false;
-    QTest::newRow("K5AH") << "K5AH 0034 + 12345\r"
-                          << "" << true << true << true << true << false << false << false << false;
-    QTest::newRow("K5AH low battery")
-        << "K5AH 0034 +B 12345\r"
-        << "" << true << true << true << true << false << false << true << false;
+    row("K5AC", "K5AC 0012 +m\r", "", "11011000");
+    row("K5AH", "K5AH 0034 + 12345\r", "", "11110000");
+    row("K5AH low battery", "K5AH 0034 +B 12345\r", "", "11110010");
     // Letters match in either case, anywhere in a K5 reply.
-    QTest::newRow("K5ACMV stirrer by case")
-        << "K5ACMV 0003\r"
-        << "" << true << true << false << false << true << true << false << false;
-    QTest::newRow("K5 no space uses held model")
-        << "K5\r"
-        << "K5AH" << true << true << true << false << false << false << false << false;
-    QTest::newRow("K51 plain") << "K51 V1 S1 0001\r"
-                               << "" << false << false << false << false << false << false << false
-                               << false;
-    QTest::newRow("K50 plain") << "K50 V1 S1 0001\r"
-                               << "" << false << true << true << false << false << false << false
-                               << false;
-    QTest::newRow("plain letters ignored")
-        << "K50 +m S1 B001\r"
-        << "" << false << true << true << false << false << false << false << false;
-    QTest::newRow("QR32") << "QR32 0001 \r"
-                          << "" << false << true << false << false << false << false << false
-                          << true;
-    QTest::newRow("ZUM410") << "ZUM410 0042 \r"
-                            << "" << false << true << false << false << false << false << false
-                            << true;
-    QTest::newRow("unreadable plain held K51")
-        << "AB\r"
-        << "K51" << false << false << false << false << false << false << false << false;
-    QTest::newRow("percent n") << "P1 1 S +m%n\r"
-                               << "" << false << false << false << true << true << false << false
-                               << false;
-    QTest::newRow("percent g") << "P1 1 S 5 v%g\r"
-                               << "" << false << true << false << false << false << true << false
-                               << false;
-    QTest::newRow("percent l") << "P1 1 S Vb%l\r"
-                               << "" << false << false << true << false << false << true << true
-                               << false;
-    QTest::newRow("percent upper N is neither")
-        << "P1 1 S 5 %N\r"
-        << "" << false << true << true << false << false << false << false << false;
-    QTest::newRow("percent K5 family")
-        << "K5XP 1 S 5 M%\r"
-        << "" << true << true << true << false << true << false << false << false;
-    QTest::newRow("percent K50 not family")
-        << "K50P 1 S 5 %g\r"
-        << "" << false << true << false << false << false << false << false << false;
+    row("K5ACMV stirrer by case", "K5ACMV 0003\r", "", "11001100");
+    row("K5 no space uses held model", "K5\r", "K5AH", "11100000");
+    row("K51 plain", "K51 V1 S1 0001\r", "", "00000000");
+    row("K50 plain", "K50 V1 S1 0001\r", "", "01100000");
+    row("plain letters ignored", "K50 +m S1 B001\r", "", "01100000");
+    row("QR32", "QR32 0001 \r", "", "01000001");
+    row("ZUM410", "ZUM410 0042 \r", "", "01000001");
+    row("unreadable plain held K51", "AB\r", "K51", "00000000");
+    row("percent n", "P1 1 S +m%n\r", "", "00011000");
+    row("percent g", "P1 1 S 5 v%g\r", "", "01000100");
+    row("percent l", "P1 1 S Vb%l\r", "", "00100110");
+    row("percent upper N is neither", "P1 1 S 5 %N\r", "", "01100000");
+    row("percent K5 family", "K5XP 1 S 5 M%\r", "", "11101000");
+    row("percent K50 not family", "K50P 1 S 5 %g\r", "", "01000000");
 }
 
 void StatusReplyTest::flags() {
@@ -279,24 +191,19 @@ void StatusReplyTest::versionReply_data() {
     QTest::addColumn<QString>("reply");
     QTest::addColumn<QString>("version");
     QTest::addColumn<QString>("serial");
-    QTest::newRow("full") << "QR32VER 1.5 A12345\r"
-                          << "1.5"
-                          << "A12345";
-    QTest::newRow("exactly 18") << "QR32VER 1.5 A12345"
-                                << "1.5"
-                                << "A12345";
-    QTest::newRow("17 characters") << "QR32VER 1.5 A1234"
-                                   << ""
-                                   << "";
-    QTest::newRow("empty") << ""
-                           << ""
-                           << "";
-    QTest::newRow("high bytes") << latin1("\xff\xff\xff\xff\xff\xff\xff\xff\xe9\x01"
-                                          "2 "
-                                          "\x80\x81\x82\x83\x84\x85\r")
-                                << latin1("\xe9\x01"
-                                          "2")
-                                << latin1("\x80\x81\x82\x83\x84\x85");
+    auto row = [](const char* tag, const QString& reply, const QString& version,
+                  const QString& serial) { QTest::newRow(tag) << reply << version << serial; };
+    row("full", "QR32VER 1.5 A12345\r", "1.5", "A12345");
+    row("exactly 18", "QR32VER 1.5 A12345", "1.5", "A12345");
+    row("17 characters", "QR32VER 1.5 A1234", "", "");
+    row("empty", "", "", "");
+    row("high bytes",
+        latin1("\xff\xff\xff\xff\xff\xff\xff\xff\xe9\x01"
+               "2 "
+               "\x80\x81\x82\x83\x84\x85\r"),
+        latin1("\xe9\x01"
+               "2"),
+        latin1("\x80\x81\x82\x83\x84\x85"));
 }
 
 void StatusReplyTest::versionReply() {
