@@ -64,57 +64,40 @@ void LineRulesTest::reformat_data() {
     QTest::addColumn<bool>("ok");
     QTest::addColumn<QString>("line");
 
-    QTest::newRow("four-digit year")
-        << QStringLiteral("  7.03 pH 25.0C 12/03/2004 10:15:00\r") << general() << true
-        << QStringLiteral("12/03/2004 10:15:00   7.03 pH 25.0C");
-    QTest::newRow("four-digit year, reading right against the date")
-        << QStringLiteral("1.413mS12/03/2004 10:15:00\r") << general() << true
-        << QStringLiteral("12/03/2004 10:15:00 1.413mS");
-    QTest::newRow("two-digit year 04") << QStringLiteral("R 12/03/04 10:15:00\r") << general()
-                                       << true << QStringLiteral("12/03/2004  10:15:00 R");
-    QTest::newRow("two-digit year 75")
-        << QStringLiteral(" 1*413ppK 31/12/75 23:59:59\r") << general() << true
-        << QStringLiteral("31/12/2075  23:59:59  1*413ppK");
-    QTest::newRow("two-digit year 76")
-        << QStringLiteral(" 1*413ppK 01/01/76 00:00:00\r") << general() << true
-        << QStringLiteral("01/01/1976  00:00:00  1*413ppK");
-    QTest::newRow("two-digit year 99") << QStringLiteral("X 01/01/99 00:00:00\r") << general()
-                                       << true << QStringLiteral("01/01/1999  00:00:00 X");
-    QTest::newRow("two-digit year 00") << QStringLiteral("X 01/01/00 00:00:00\r") << general()
-                                       << true << QStringLiteral("01/01/2000  00:00:00 X");
-    QTest::newRow("K5 family") << QStringLiteral("  1.413mS 12/03 10:15\r") << k5() << true
-                               << QStringLiteral("12/03 10:15   1.413mS");
-    QTest::newRow("K5, no space before the field") << QStringLiteral("0.5ppK12/03 10:15\r") << k5()
-                                                   << true << QStringLiteral("12/03 10:15 0.5ppK");
-    QTest::newRow("marin: two characters dropped")
-        << QStringLiteral("1.413mS--12/03/2004 10:15\r") << marin() << true
-        << QStringLiteral("12/03/2004 10:15 1.413mS");
-    QTest::newRow("only one trailing space dropped")
-        << QStringLiteral("R   12/03/2004 10:15:00\r") << general() << true
-        << QStringLiteral("12/03/2004 10:15:00 R  ");
-    QTest::newRow("percent unchanged, CR kept")
-        << QStringLiteral(" 12/03/2004 10:15 0003  7.00\r") << percent(true) << true
-        << QStringLiteral(" 12/03/2004 10:15 0003  7.00\r");
-    QTest::newRow("percent, even a short line")
-        << QStringLiteral("x\r") << percent(false) << true << QStringLiteral("x\r");
-    QTest::newRow("shortest general record: empty reading")
-        << QStringLiteral("12/03/2004 10:15:00\r") << general() << true
-        << QStringLiteral("12/03/2004 10:15:00 ");
-    QTest::newRow("shortest two-digit record") << QStringLiteral("12/03/04 10:15:00\r") << general()
-                                               << true << QStringLiteral("12/03/2004  10:15:00 ");
+    auto row = [](const char* tag, const QString& record, const LineLayout& layout, bool ok,
+                  const QString& line) { QTest::newRow(tag) << record << layout << ok << line; };
+    row("four-digit year", "  7.03 pH 25.0C 12/03/2004 10:15:00\r", general(), true,
+        "12/03/2004 10:15:00   7.03 pH 25.0C");
+    row("four-digit year, reading right against the date", "1.413mS12/03/2004 10:15:00\r",
+        general(), true, "12/03/2004 10:15:00 1.413mS");
+    row("two-digit year 04", "R 12/03/04 10:15:00\r", general(), true, "12/03/2004  10:15:00 R");
+    row("two-digit year 75", " 1*413ppK 31/12/75 23:59:59\r", general(), true,
+        "31/12/2075  23:59:59  1*413ppK");
+    row("two-digit year 76", " 1*413ppK 01/01/76 00:00:00\r", general(), true,
+        "01/01/1976  00:00:00  1*413ppK");
+    row("two-digit year 99", "X 01/01/99 00:00:00\r", general(), true, "01/01/1999  00:00:00 X");
+    row("two-digit year 00", "X 01/01/00 00:00:00\r", general(), true, "01/01/2000  00:00:00 X");
+    row("K5 family", "  1.413mS 12/03 10:15\r", k5(), true, "12/03 10:15   1.413mS");
+    row("K5, no space before the field", "0.5ppK12/03 10:15\r", k5(), true, "12/03 10:15 0.5ppK");
+    row("marin: two characters dropped", "1.413mS--12/03/2004 10:15\r", marin(), true,
+        "12/03/2004 10:15 1.413mS");
+    row("only one trailing space dropped", "R   12/03/2004 10:15:00\r", general(), true,
+        "12/03/2004 10:15:00 R  ");
+    row("percent unchanged, CR kept", " 12/03/2004 10:15 0003  7.00\r", percent(true), true,
+        " 12/03/2004 10:15 0003  7.00\r");
+    row("percent, even a short line", "x\r", percent(false), true, "x\r");
+    row("shortest general record: empty reading", "12/03/2004 10:15:00\r", general(), true,
+        "12/03/2004 10:15:00 ");
+    row("shortest two-digit record", "12/03/04 10:15:00\r", general(), true,
+        "12/03/2004  10:15:00 ");
 
-    QTest::newRow("too short: general 19")
-        << QStringLiteral("2/03/2004 10:15:00\r") << general() << false << QString();
-    QTest::newRow("too short: two-digit 17")
-        << QStringLiteral("2/03/04 10:15:00\r") << general() << false << QString();
-    QTest::newRow("too short: K5 11")
-        << QStringLiteral("2/03 10:15\r") << k5() << false << QString();
-    QTest::newRow("too short: marin 18")
-        << QStringLiteral("-12/03/2004 10:15\r") << marin() << false << QString();
-    QTest::newRow("empty") << QString() << general() << false << QString();
-    QTest::newRow("lone CR") << CR << k5() << false << QString();
-    QTest::newRow("year that is not a number")
-        << QStringLiteral("R 12/03/x4 10:15:00\r") << general() << false << QString();
+    row("too short: general 19", "2/03/2004 10:15:00\r", general(), false, QString());
+    row("too short: two-digit 17", "2/03/04 10:15:00\r", general(), false, QString());
+    row("too short: K5 11", "2/03 10:15\r", k5(), false, QString());
+    row("too short: marin 18", "-12/03/2004 10:15\r", marin(), false, QString());
+    row("empty", QString(), general(), false, QString());
+    row("lone CR", CR, k5(), false, QString());
+    row("year that is not a number", "R 12/03/x4 10:15:00\r", general(), false, QString());
 }
 
 void LineRulesTest::reformat() {
@@ -149,20 +132,18 @@ void LineRulesTest::qr32Record_data() {
     QTest::addColumn<QString>("line");
 
     const QString reading = QStringLiteral("  12.34 mS/cm  25.0");
-    QTest::newRow("37 characters")
-        << qr32Reply() << true << QStringLiteral("12/03/2004 10:15:00") + reading + CR;
-    QTest::newRow("38: line feed in front kept")
-        << QStringLiteral("\n") + qr32Reply() << true
-        << QStringLiteral("\n12/03/2004 10:15:00") + reading + CR;
-    QTest::newRow("39: nothing cut off")
-        << QStringLiteral("\n\n") + qr32Reply() << true
-        << QStringLiteral("\n\n12/03/2004 10:15:00") + reading + CR;
-    QTest::newRow("short record is not repeated") << QStringLiteral("12/03/04 10.15.00 7\r") << true
-                                                  << QStringLiteral("12/03/2004 10:15:00 7\r");
-    QTest::newRow("15 characters")
-        << QStringLiteral("12/03/04 10.15.") << true << QStringLiteral("12/03/2004 10:15:");
-    QTest::newRow("14 characters") << QStringLiteral("12/03/04 10.15") << false << QString();
-    QTest::newRow("empty") << QString() << false << QString();
+    auto row = [](const char* tag, const QString& record, bool ok, const QString& line) {
+        QTest::newRow(tag) << record << ok << line;
+    };
+    row("37 characters", qr32Reply(), true, "12/03/2004 10:15:00" + reading + CR);
+    row("38: line feed in front kept", "\n" + qr32Reply(), true,
+        "\n12/03/2004 10:15:00" + reading + CR);
+    row("39: nothing cut off", "\n\n" + qr32Reply(), true,
+        "\n\n12/03/2004 10:15:00" + reading + CR);
+    row("short record is not repeated", "12/03/04 10.15.00 7\r", true, "12/03/2004 10:15:00 7\r");
+    row("15 characters", "12/03/04 10.15.", true, "12/03/2004 10:15:");
+    row("14 characters", "12/03/04 10.15", false, QString());
+    row("empty", QString(), false, QString());
 }
 
 void LineRulesTest::qr32Record() {
@@ -186,43 +167,35 @@ void LineRulesTest::realTimeLine_data() {
     QTest::addColumn<QString>("line");
 
     const QString pLog = QStringLiteral("ABCDEFGHIJK0001XYZ\r");
-    QTest::newRow("percent with log: Log# overwritten")
-        << pLog << 7 << percent(true) << true << 12 << 4 << true
-        << QStringLiteral("ABCDEFGHIJK   7XYZ\r");
-    QTest::newRow("percent with log: at most the column width")
-        << pLog << 7 << percent(true) << true << 12 << 3 << true
-        << QStringLiteral("ABCDEFGHIJK   1XYZ\r");
-    QTest::newRow("percent with log: at most the line's end")
-        << QStringLiteral("ABCDEFGHIJK00") << 1234 << percent(true) << true << 12 << 4 << true
-        << QStringLiteral("ABCDEFGHIJK12");
-    QTest::newRow("percent with log: long number in a 4-wide column")
-        << pLog << 12345 << percent(true) << true << 12 << 4 << true
-        << QStringLiteral("ABCDEFGHIJK1234XYZ\r");
-    QTest::newRow("percent with log: column unknown, line unchanged")
-        << pLog << 7 << percent(true) << false << 12 << 4 << true << pLog;
-    QTest::newRow("percent with log: reply shorter than the column")
-        << QStringLiteral("ABCDEFGHI\r") << 7 << percent(true) << true << 12 << 4 << false
-        << QString();
-    QTest::newRow("percent without log: date, time, number in front")
-        << QStringLiteral("  7.00 pH\r") << 7 << percent(false) << false << 0 << 0 << true
-        << QStringLiteral("06/12/2026 09:05:03    7   7.00 pH\r");
-    QTest::newRow("QR32") << qr32Reply() << 7 << qr32() << false << 0 << 0 << true
-                          << QStringLiteral("12/03/2004 10:15:00    7.34 mS/cm  25.0\r");
-    QTest::newRow("QR32 too short")
-        << QStringLiteral("12/03/04 10.15") << 1 << qr32() << false << 0 << 0 << false << QString();
-    QTest::newRow("general: number replaces the first four")
-        << QStringLiteral("0000  7.03pH 12/03/2004 10:15:00\r") << 7 << general() << false << 0 << 0
-        << true << QStringLiteral("12/03/2004 10:15:00    7  7.03pH");
-    QTest::newRow("general, two-digit year")
-        << QStringLiteral("0000  7.03pH 12/03/80 10:15:00\r") << 10 << general() << false << 0 << 0
-        << true << QStringLiteral("12/03/1980  10:15:00   10  7.03pH");
-    QTest::newRow("K5") << QStringLiteral("0000 1.4mS 12/03 10:15\r") << 7 << k5() << false << 0
-                        << 0 << true << QStringLiteral("12/03 10:15    7 1.4mS");
-    QTest::newRow("fewer than four characters")
-        << QStringLiteral("12\r") << 1 << general() << false << 0 << 0 << false << QString();
-    QTest::newRow("too short to move the date")
-        << QStringLiteral("0000 1.4mS 10:15\r") << 1 << general() << false << 0 << 0 << false
-        << QString();
+    auto row = [](const char* tag, const QString& reply, int number, const LineLayout& layout,
+                  bool known, int start, int width, bool ok, const QString& line) {
+        QTest::newRow(tag) << reply << number << layout << known << start << width << ok << line;
+    };
+    row("percent with log: Log# overwritten", pLog, 7, percent(true), true, 12, 4, true,
+        "ABCDEFGHIJK   7XYZ\r");
+    row("percent with log: at most the column width", pLog, 7, percent(true), true, 12, 3, true,
+        "ABCDEFGHIJK   1XYZ\r");
+    row("percent with log: at most the line's end", "ABCDEFGHIJK00", 1234, percent(true), true, 12,
+        4, true, "ABCDEFGHIJK12");
+    row("percent with log: long number in a 4-wide column", pLog, 12345, percent(true), true, 12, 4,
+        true, "ABCDEFGHIJK1234XYZ\r");
+    row("percent with log: column unknown, line unchanged", pLog, 7, percent(true), false, 12, 4,
+        true, pLog);
+    row("percent with log: reply shorter than the column", "ABCDEFGHI\r", 7, percent(true), true,
+        12, 4, false, QString());
+    row("percent without log: date, time, number in front", "  7.00 pH\r", 7, percent(false), false,
+        0, 0, true, "06/12/2026 09:05:03    7   7.00 pH\r");
+    row("QR32", qr32Reply(), 7, qr32(), false, 0, 0, true,
+        "12/03/2004 10:15:00    7.34 mS/cm  25.0\r");
+    row("QR32 too short", "12/03/04 10.15", 1, qr32(), false, 0, 0, false, QString());
+    row("general: number replaces the first four", "0000  7.03pH 12/03/2004 10:15:00\r", 7,
+        general(), false, 0, 0, true, "12/03/2004 10:15:00    7  7.03pH");
+    row("general, two-digit year", "0000  7.03pH 12/03/80 10:15:00\r", 10, general(), false, 0, 0,
+        true, "12/03/1980  10:15:00   10  7.03pH");
+    row("K5", "0000 1.4mS 12/03 10:15\r", 7, k5(), false, 0, 0, true, "12/03 10:15    7 1.4mS");
+    row("fewer than four characters", "12\r", 1, general(), false, 0, 0, false, QString());
+    row("too short to move the date", "0000 1.4mS 10:15\r", 1, general(), false, 0, 0, false,
+        QString());
 }
 
 void LineRulesTest::realTimeLine() {
@@ -260,32 +233,24 @@ void LineRulesTest::logColumn_data() {
     QTest::addColumn<int>("start");
     QTest::addColumn<int>("width");
 
-    QTest::newRow("three columns, two-digit start")
-        << QStringLiteral(" Date Time Log# pH\r") << QStringLiteral("4,2,4,7,4,12,4,17,2\r") << true
-        << 12 << 4;
-    QTest::newRow("two columns, one-digit start")
-        << QStringLiteral(" Date Log# pH\r") << QStringLiteral("3,1,4,5,4,9,2\r") << true << 5 << 4;
-    QTest::newRow("first column") << QStringLiteral(" Log# pH\r") << QStringLiteral("2,1,4,6,2\r")
-                                  << true << 1 << 4;
-    QTest::newRow("runs of spaces count once")
-        << QStringLiteral("   Date     Time    Log#   pH") << QStringLiteral("4,2,4,7,4,12,4,17,2")
-        << true << 12 << 4;
-    QTest::newRow("three-digit start")
-        << QStringLiteral(" A B Log#") << QStringLiteral("3,1,40,50,45,100,4") << true << 100 << 4;
-    QTest::newRow("no Log in the header") << QStringLiteral(" Date Time pH\r")
-                                          << QStringLiteral("3,2,4,7,4,12,4\r") << false << 0 << 0;
-    QTest::newRow("too few commas")
-        << QStringLiteral(" Date Time Log# pH\r") << QStringLiteral("4,2,4,7\r") << false << 0 << 0;
-    QTest::newRow("start without width") << QStringLiteral(" Date Time Log# pH\r")
-                                         << QStringLiteral("4,2,4,7,4,12\r") << false << 0 << 0;
-    QTest::newRow("no commas at all")
-        << QStringLiteral(" Date Time Log# pH\r") << QStringLiteral("BUSY\r") << false << 0 << 0;
-    QTest::newRow("Log with no column before it")
-        << QStringLiteral("Log# pH") << QStringLiteral("2,1,4,6,2") << false << 0 << 0;
-    QTest::newRow("fields that are not numbers")
-        << QStringLiteral(" Date Time Log# pH") << QStringLiteral("4,2,4,7,4,x2,4,17,2") << false
-        << 0 << 0;
-    QTest::newRow("empty") << QString() << QString() << false << 0 << 0;
+    auto row = [](const char* tag, const QString& header, const QString& position, bool found,
+                  int start, int width) {
+        QTest::newRow(tag) << header << position << found << start << width;
+    };
+    row("three columns, two-digit start", " Date Time Log# pH\r", "4,2,4,7,4,12,4,17,2\r", true, 12,
+        4);
+    row("two columns, one-digit start", " Date Log# pH\r", "3,1,4,5,4,9,2\r", true, 5, 4);
+    row("first column", " Log# pH\r", "2,1,4,6,2\r", true, 1, 4);
+    row("runs of spaces count once", "   Date     Time    Log#   pH", "4,2,4,7,4,12,4,17,2", true,
+        12, 4);
+    row("three-digit start", " A B Log#", "3,1,40,50,45,100,4", true, 100, 4);
+    row("no Log in the header", " Date Time pH\r", "3,2,4,7,4,12,4\r", false, 0, 0);
+    row("too few commas", " Date Time Log# pH\r", "4,2,4,7\r", false, 0, 0);
+    row("start without width", " Date Time Log# pH\r", "4,2,4,7,4,12\r", false, 0, 0);
+    row("no commas at all", " Date Time Log# pH\r", "BUSY\r", false, 0, 0);
+    row("Log with no column before it", "Log# pH", "2,1,4,6,2", false, 0, 0);
+    row("fields that are not numbers", " Date Time Log# pH", "4,2,4,7,4,x2,4,17,2", false, 0, 0);
+    row("empty", QString(), QString(), false, 0, 0);
 }
 
 void LineRulesTest::logColumn() {
