@@ -7,6 +7,8 @@
 #include "shell/Prompts.h"
 #include "shell/SystemClock.h"
 
+#include "ReadingsBench.h"
+
 #include <Meter.h>
 #include <QAction>
 #include <QApplication>
@@ -20,30 +22,6 @@
 #include <ctime>
 
 namespace {
-
-// Answers every message with its last button and never shows a window.
-class QuietPrompts : public Prompts {
-public:
-    Answer show(const QString& text, Icon, Buttons buttons, bool) override {
-        std::fprintf(stderr, "message: %s\n", qPrintable(text));
-        if (buttons == Buttons::YesNo)
-            return Answer::No;
-        return buttons == Buttons::RetryCancel ? Answer::Cancel : Answer::Ok;
-    }
-};
-
-class NoPlatformDialogs : public PlatformDialogs {
-public:
-    std::optional<SaveChoice> askSaveFile(QWidget*, const QString&, const QString&,
-                                          const QStringList&) override {
-        return std::nullopt;
-    }
-    std::optional<QString> askOpenFile(QWidget*, const QString&, const QStringList&) override {
-        return std::nullopt;
-    }
-    bool askPrinter(QWidget*, QPrinter&) override { return false; }
-    bool openWithDefaultApplication(const QUrl&) override { return false; }
-};
 
 double threadCpuSeconds() {
     timespec ts{};
@@ -92,10 +70,10 @@ int main(int argc, char** argv) {
         first.setValue("Settings/FirstRun", "False");
     }
 
-    QuietPrompts prompts;
+    readingsbench::PrintingPrompts prompts;
     SystemClock clock;
     QtSerialLine serial;
-    NoPlatformDialogs dialogs;
+    readingsbench::NoPlatformDialogs dialogs;
     MainWindow window({&prompts, &clock, &serial, &dialogs});
     window.endProgram = [] {};
 
