@@ -19,6 +19,14 @@ bool noModal() {
     return QApplication::activeModalWidget() == nullptr;
 }
 
+// Starts the voltage display and waits for its first line.
+bool startVoltage(WindowFixture& f, const QString& profile) {
+    if (!f.startDetected(profile))
+        return false;
+    f.c().mnuVoltage->trigger();
+    return f.waitUntil([&] { return f.state().workspaceText == kVoltageLine; }, 1000);
+}
+
 int visibleCommErrorDialogs() {
     int n = 0;
     for (QWidget* w : QApplication::topLevelWidgets())
@@ -58,24 +66,17 @@ void ControlCommandsTest::commands_data() {
     QTest::addColumn<QByteArray>("notSent");
     QTest::addColumn<QString>("message");
 
-    QTest::newRow("start stirring")
-        << "k5ac"
-        << "cmdStartStirring" << QByteArray("?M\r") << QByteArray() << "Stirrer  started.";
-    QTest::newRow("stop stirring")
-        << "k5ac"
-        << "cmdStopStirring" << QByteArray("?N\r") << QByteArray() << "Stirrer  stopped.";
-    QTest::newRow("enable logging K5AC")
-        << "k5ac"
-        << "cmdEnableLogging" << QByteArray("?G\r") << QByteArray("?J\r") << "Logging  enabled.";
-    QTest::newRow("enable logging K5AH")
-        << "k5ah"
-        << "cmdEnableLogging" << QByteArray("?J\r") << QByteArray("?G\r") << "Logging  enabled.";
-    QTest::newRow("enable logging percent")
-        << "percent-log"
-        << "cmdEnableLogging" << QByteArray("?J\r") << QByteArray("?G\r") << "Logging  enabled.";
-    QTest::newRow("disable logging")
-        << "k5gj"
-        << "cmdDisableLogging" << QByteArray("?F\r") << QByteArray() << "Logging  disabled.";
+    auto row = [](const char* tag, const QString& profile, const QString& button,
+                  const QByteArray& sent, const QByteArray& notSent, const QString& message) {
+        QTest::newRow(tag) << profile << button << sent << notSent << message;
+    };
+    row("start stirring", "k5ac", "cmdStartStirring", "?M\r", "", "Stirrer  started.");
+    row("stop stirring", "k5ac", "cmdStopStirring", "?N\r", "", "Stirrer  stopped.");
+    row("enable logging K5AC", "k5ac", "cmdEnableLogging", "?G\r", "?J\r", "Logging  enabled.");
+    row("enable logging K5AH", "k5ah", "cmdEnableLogging", "?J\r", "?G\r", "Logging  enabled.");
+    row("enable logging percent", "percent-log", "cmdEnableLogging", "?J\r", "?G\r",
+        "Logging  enabled.");
+    row("disable logging", "k5gj", "cmdDisableLogging", "?F\r", "", "Logging  disabled.");
 }
 
 void ControlCommandsTest::commands() {
@@ -287,10 +288,8 @@ void ControlCommandsTest::voltageDisplay() {
 
 void ControlCommandsTest::voltageEndsOnBusy() {
     WindowFixture f;
-    QVERIFY(f.startDetected("percent-nolog"));
+    QVERIFY(startVoltage(f, "percent-nolog"));
     const MainControls& c = f.c();
-    c.mnuVoltage->trigger();
-    QVERIFY(f.waitUntil([&] { return f.state().workspaceText == kVoltageLine; }, 1000));
     f.meter->setReply("?V", "BUSY\r");
     // The busy prompt comes when the reply window has run out; its Cancel leaves "BUSY".
     QVERIFY(f.waitUntil([&] { return !c.tmrDisplayVoltage->isActive(); }, 10000));
@@ -301,10 +300,8 @@ void ControlCommandsTest::voltageEndsOnBusy() {
 
 void ControlCommandsTest::voltageLinkLost() {
     WindowFixture f;
-    QVERIFY(f.startDetected("percent-log"));
+    QVERIFY(startVoltage(f, "percent-log"));
     const MainControls& c = f.c();
-    c.mnuVoltage->trigger();
-    QVERIFY(f.waitUntil([&] { return f.state().workspaceText == kVoltageLine; }, 1000));
     f.meter->vanish();
     int dialogsWhileOpen = -1;
     DialogDriver::whenModal("frmCommError", [&](QWidget* d) {
@@ -325,10 +322,8 @@ void ControlCommandsTest::voltageLinkLost() {
 
 void ControlCommandsTest::commandStopsVoltage() {
     WindowFixture f;
-    QVERIFY(f.startDetected("percent-log"));
+    QVERIFY(startVoltage(f, "percent-log"));
     const MainControls& c = f.c();
-    c.mnuVoltage->trigger();
-    QVERIFY(f.waitUntil([&] { return f.state().workspaceText == kVoltageLine; }, 1000));
     c.cmdStopStirring->click();
     QVERIFY(!c.tmrDisplayVoltage->isActive());
     QCOMPARE(c.RichTextBox1->toPlainText(), QString());
