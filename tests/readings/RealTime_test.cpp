@@ -22,10 +22,9 @@ private slots:
     void continueAfterStopAndNewTableAfterLog();
     void lineLimit();
     void resendRestartsRun();
-    void errorReplyEndsRun();
     void meterLost();
-    void replyTooShort();
-    void overdueReading();
+    void faultEndsRun_data();
+    void faultEndsRun();
     void acrossMidnight();
     void percentWithLogNumbersLogColumn();
 
@@ -62,26 +61,21 @@ void RealTimeTest::intervalDialog_data() {
     QTest::addColumn<int>("seconds"); // 0: rejected, the dialog stays open
     QTest::addColumn<QString>("message");
 
-    QTest::newRow("2 at 1200") << 1200 << "K50"
-                               << "2" << 0 << "Minimum log interval is 3 second(s) at 1200  baud";
-    QTest::newRow("3 at 1200") << 1200 << "K50"
-                               << "3" << 3 << QString();
-    QTest::newRow("2 at 9600") << 9600 << "K50"
-                               << "2" << 2 << QString();
-    QTest::newRow("-5") << 9600 << "K50"
-                        << "-5" << 5 << QString();
-    QTest::newRow("2.5") << 9600 << "K50"
-                         << "2.5" << 0 << "Please specify log interval in whole seconds.";
-    QTest::newRow("letters") << 9600 << "K50"
-                             << "ten" << 0 << "Log interval must be numeric.";
-    QTest::newRow("3601") << 9600 << "K50"
-                          << "3601" << 0 << "Maximum  log  interval  is  3600  seconds";
-    QTest::newRow("3600") << 9600 << "K50"
-                          << "3600" << 3600 << QString();
-    QTest::newRow("LXT needs 2 s") << 19200 << "LXT200"
-                                   << "1" << 0
-                                   << "Minimum log interval is 2 seconds for LXT200 model "
-                                      "instrument.";
+    auto row = [](const char* tag, int baud, const QString& model, const QString& entry,
+                  int seconds, const QString& message) {
+        QTest::newRow(tag) << baud << model << entry << seconds << message;
+    };
+    row("2 at 1200", 1200, "K50", "2", 0, "Minimum log interval is 3 second(s) at 1200  baud");
+    row("3 at 1200", 1200, "K50", "3", 3, QString());
+    row("2 at 9600", 9600, "K50", "2", 2, QString());
+    row("-5", 9600, "K50", "-5", 5, QString());
+    row("2.5", 9600, "K50", "2.5", 0, "Please specify log interval in whole seconds.");
+    row("letters", 9600, "K50", "ten", 0, "Log interval must be numeric.");
+    row("3601", 9600, "K50", "3601", 0, "Maximum  log  interval  is  3600  seconds");
+    row("3600", 9600, "K50", "3600", 3600, QString());
+    row("LXT needs 2 s", 19200, "LXT200", "1", 0,
+        "Minimum log interval is 2 seconds for LXT200 model "
+        "instrument.");
 }
 
 void RealTimeTest::intervalDialog() {
@@ -128,7 +122,7 @@ void RealTimeTest::intervalDialogShowsStoredInterval() {
 
 void RealTimeTest::cancelStartsNothing() {
     WindowFixture fx;
-    QVERIFY(fx.startDetected(QStringLiteral("plain")));
+    QVERIFY(fx.startDetected("plain"));
     fx.meter->clearReceived();
     DialogDriver::clickWhenModal(QStringLiteral("frmRealTimeInterval"),
                                  QStringLiteral("cmdCancel"));
@@ -141,11 +135,11 @@ void RealTimeTest::cancelStartsNothing() {
 
 void RealTimeTest::firstReadingAtOnceThenCountdown() {
     WindowFixture fx;
-    QVERIFY(fx.startDetected(QStringLiteral("plain")));
+    QVERIFY(fx.startDetected("plain"));
     fx.meter->setReadingReplies(
         {"0000  1.413mS 25.0C 12/03/2004 10:15:00\r", "0000  2.000mS 25.0C 12/03/2004 10:15:05\r"});
     fx.meter->clearReceived();
-    startRealTime(fx, QStringLiteral("5"));
+    startRealTime(fx, "5");
 
     const MainControls& c = fx.c();
     QCOMPARE(fx.meter->count("?D\r"), 1);
@@ -182,8 +176,8 @@ void RealTimeTest::firstReadingAtOnceThenCountdown() {
 
 void RealTimeTest::shortIntervalHasNoCountdown() {
     WindowFixture fx;
-    QVERIFY(fx.startDetected(QStringLiteral("plain")));
-    startRealTime(fx, QStringLiteral("2"));
+    QVERIFY(fx.startDetected("plain"));
+    startRealTime(fx, "2");
     QCOMPARE(fx.c().lblMessage->text(), QStringLiteral("Data logging in progress ..."));
     QVERIFY(!fx.c().tmrDisplayInterval->isActive());
     QVERIFY(fx.c().tmrRealTime->isActive());
@@ -194,9 +188,9 @@ void RealTimeTest::shortIntervalHasNoCountdown() {
 
 void RealTimeTest::longIntervalSchedule() {
     WindowFixture fx;
-    QVERIFY(fx.startDetected(QStringLiteral("plain")));
+    QVERIFY(fx.startDetected("plain"));
     fx.meter->clearReceived();
-    startRealTime(fx, QStringLiteral("120"));
+    startRealTime(fx, "120");
     const MainControls& c = fx.c();
     QCOMPARE(fx.meter->count("?D\r"), 1);
 
@@ -223,14 +217,14 @@ void RealTimeTest::longIntervalSchedule() {
 
 void RealTimeTest::continueAfterStopAndNewTableAfterLog() {
     WindowFixture fx;
-    QVERIFY(fx.startDetected(QStringLiteral("plain")));
-    startRealTime(fx, QStringLiteral("1"));
+    QVERIFY(fx.startDetected("plain"));
+    startRealTime(fx, "1");
     fireReading(fx);
     QCOMPARE(fx.state().readingNumber, 2);
     fx.c().cmdStopCurrentData->click();
 
     // Continuing: no save prompt, the table goes on and so does the numbering.
-    startRealTime(fx, QStringLiteral("1"));
+    startRealTime(fx, "1");
     QVERIFY(fx.prompts.shown.isEmpty());
     QStringList l = lines(fx.state().workspaceText);
     QCOMPARE(l.size(), 3);
@@ -241,7 +235,7 @@ void RealTimeTest::continueAfterStopAndNewTableAfterLog() {
     fx.c().cmdLoggedData->click();
     QVERIFY(fx.prompts.saw(QStringLiteral("Data will be lost!  Would you like to save now?")));
     QVERIFY(fx.c().mnuLog->isChecked());
-    startRealTime(fx, QStringLiteral("1"));
+    startRealTime(fx, "1");
     l = lines(fx.state().workspaceText);
     QCOMPARE(l.size(), 1);
     QCOMPARE(l[0].mid(20, 4), QStringLiteral("   1"));
@@ -250,8 +244,8 @@ void RealTimeTest::continueAfterStopAndNewTableAfterLog() {
 
 void RealTimeTest::lineLimit() {
     WindowFixture fx;
-    QVERIFY(fx.startDetected(QStringLiteral("plain")));
-    startRealTime(fx, QStringLiteral("1"));
+    QVERIFY(fx.startDetected("plain"));
+    startRealTime(fx, "1");
     AppState& s = fx.state();
     s.lineCount = RealTimeRun::kLineLimit - 1;
     fx.c().tmrRealTime->stop();
@@ -268,8 +262,8 @@ void RealTimeTest::lineLimit() {
 
 void RealTimeTest::resendRestartsRun() {
     WindowFixture fx;
-    QVERIFY(fx.startDetected(QStringLiteral("plain")));
-    startRealTime(fx, QStringLiteral("5"));
+    QVERIFY(fx.startDetected("plain"));
+    startRealTime(fx, "5");
     AppState& s = fx.state();
     const double firstStart = s.runStartTime;
     fx.meter->clearReceived();
@@ -290,23 +284,46 @@ void RealTimeTest::resendRestartsRun() {
     fx.c().cmdStopCurrentData->click();
 }
 
-void RealTimeTest::errorReplyEndsRun() {
+void RealTimeTest::faultEndsRun_data() {
+    QTest::addColumn<QString>("interval");
+    QTest::addColumn<QByteArray>("reply"); // empty: the meter's own reading
+    QTest::addColumn<double>("late");
+    QTest::addColumn<QString>("prompt"); // empty: the over-use dialog instead
+    QTest::addColumn<int>("lineCount");
+    QTest::newRow("error reply") << "4" << QByteArray("ERROR\r") << 0.0
+                                 << " This function is not available with your firmware version."
+                                 << 1;
+    QTest::newRow("reply too short") << "4" << QByteArray("0000 1.4mS\r") << 0.0 << "" << 1;
+    // The reading comes three seconds late: the one after it is overdue already.
+    QTest::newRow("overdue reading") << "1" << QByteArray() << 3.0 << "" << 2;
+}
+
+void RealTimeTest::faultEndsRun() {
+    QFETCH(QString, interval);
+    QFETCH(QByteArray, reply);
+    QFETCH(double, late);
+    QFETCH(QString, prompt);
     WindowFixture fx;
-    QVERIFY(fx.startDetected(QStringLiteral("plain")));
-    startRealTime(fx, QStringLiteral("4"));
-    fx.meter->setReply("?D", "ERROR\r");
-    fireReading(fx);
-    QVERIFY(fx.prompts.saw(
-        QStringLiteral(" This function is not available with your firmware version.")));
+    QVERIFY(fx.startDetected("plain"));
+    startRealTime(fx, interval);
+    if (!reply.isEmpty())
+        fx.meter->setReply("?D", reply);
+    if (prompt.isEmpty())
+        DialogDriver::clickWhenModal(QStringLiteral("frmCPUOverUse"), QStringLiteral("Command1"));
+    fireReading(fx, late);
+    if (!prompt.isEmpty())
+        QVERIFY(fx.prompts.saw(prompt));
     QVERIFY(commandsBack(fx));
-    QCOMPARE(lines(fx.state().workspaceText).size(), 1);
-    QCOMPARE(fx.settings.value(QStringLiteral("LogInvterval")), QStringLiteral("4"));
+    QTEST(int(lines(fx.state().workspaceText).size()), "lineCount");
+    QTEST(fx.state().readingNumber, "lineCount");
+    QVERIFY(!fx.c().tmrRealTime->isActive());
+    QCOMPARE(fx.settings.value(QStringLiteral("LogInvterval")), interval);
 }
 
 void RealTimeTest::meterLost() {
     WindowFixture fx;
-    QVERIFY(fx.startDetected(QStringLiteral("plain")));
-    startRealTime(fx, QStringLiteral("4"));
+    QVERIFY(fx.startDetected("plain"));
+    startRealTime(fx, "4");
     fx.meter->setReply("?D", "EXIT\r");
     fireReading(fx);
 
@@ -325,30 +342,6 @@ void RealTimeTest::meterLost() {
     QCOMPARE(lines(c.RichTextBox1->toPlainText()).size(), 1);
 }
 
-void RealTimeTest::replyTooShort() {
-    WindowFixture fx;
-    QVERIFY(fx.startDetected(QStringLiteral("plain")));
-    startRealTime(fx, QStringLiteral("4"));
-    fx.meter->setReply("?D", "0000 1.4mS\r");
-    DialogDriver::clickWhenModal(QStringLiteral("frmCPUOverUse"), QStringLiteral("Command1"));
-    fireReading(fx);
-    QVERIFY(commandsBack(fx));
-    QCOMPARE(lines(fx.state().workspaceText).size(), 1);
-    QCOMPARE(fx.state().readingNumber, 1);
-}
-
-void RealTimeTest::overdueReading() {
-    WindowFixture fx;
-    QVERIFY(fx.startDetected(QStringLiteral("plain")));
-    startRealTime(fx, QStringLiteral("1"));
-    DialogDriver::clickWhenModal(QStringLiteral("frmCPUOverUse"), QStringLiteral("Command1"));
-    // The reading comes three seconds late: the one after it is overdue already.
-    fireReading(fx, 3.0);
-    QCOMPARE(lines(fx.state().workspaceText).size(), 2);
-    QVERIFY(commandsBack(fx));
-    QVERIFY(!fx.c().tmrRealTime->isActive());
-}
-
 void RealTimeTest::acrossMidnight() {
     WindowFixture fx;
     QVERIFY(fx.startDetected(QStringLiteral("percent-nolog")));
@@ -356,7 +349,7 @@ void RealTimeTest::acrossMidnight() {
     const QDateTime beforeMidnight(now.date(), QTime(23, 59, 59, 500));
     fx.clock.setWallShift(now.secsTo(beforeMidnight));
     fx.meter->setReadingReplies({"  7.00   1.413mS\r"});
-    startRealTime(fx, QStringLiteral("1"));
+    startRealTime(fx, "1");
     fireReading(fx);
 
     const QStringList l = lines(fx.state().workspaceText);
@@ -383,7 +376,7 @@ void RealTimeTest::percentWithLogNumbersLogColumn() {
     QVERIFY(fx.window->readings().logColumnKnown());
 
     fx.meter->setReadingReplies({" 12/03/2004 10:15:00 0042  7.00    1.413mS\r"});
-    startRealTime(fx, QStringLiteral("1"));
+    startRealTime(fx, "1");
     QCOMPARE(lines(s.workspaceText), QStringList{" 12/03/2004 10:15:00    1  7.00    1.413mS\r"});
     fx.c().cmdStopCurrentData->click();
 }
