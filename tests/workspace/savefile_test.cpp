@@ -60,20 +60,16 @@ private slots:
         QTest::addColumn<QString>("mark");
         QTest::addColumn<QString>("name");
         QTest::addColumn<bool>("both");
-        QTest::newRow("log") << "mnuLog"
-                             << "Log data" << true;
-        QTest::newRow("real time") << "mnuRealTime"
-                                   << "Current data" << true;
-        QTest::newRow("listen") << "mnuListen"
-                                << "Instrument data" << true;
-        QTest::newRow("glp") << "mnuGLP"
-                             << "GLP data" << false;
-        QTest::newRow("max min") << "mnuMaxMin"
-                                 << "MaxMin data" << false;
-        QTest::newRow("voltage") << "mnuVoltage"
-                                 << "Voltage data" << false;
-        QTest::newRow("opened file") << ""
-                                     << "Instrument data" << false;
+        auto row = [](const char* mark, const char* name, bool both) {
+            QTest::newRow(*mark ? mark : "opened file") << QString(mark) << QString(name) << both;
+        };
+        row("mnuLog", "Log data", true);
+        row("mnuRealTime", "Current data", true);
+        row("mnuListen", "Instrument data", true);
+        row("mnuGLP", "GLP data", false);
+        row("mnuMaxMin", "MaxMin data", false);
+        row("mnuVoltage", "Voltage data", false);
+        row("", "Instrument data", false);
     }
     void offersFiltersAndNameByDisplayKind() {
         QFETCH(QString, mark);
@@ -188,6 +184,7 @@ private slots:
         QVERIFY(ws->state().workspaceSaved);
     }
 
+    // Also checks the file-exists dialog's own texts.
     void appendAndOverwrite_data() {
         QTest::addColumn<QString>("button");
         QTest::addColumn<QByteArray>("expected");
@@ -200,28 +197,20 @@ private slots:
         QVERIFY(writeBytes(path("old.txt"), "old\n"));
         ws->fill(kLog, ws->c().mnuLog, kHeader);
         ws->dialogs.answerSave(path("old.txt"));
-        DialogDriver::clickWhenModal(QStringLiteral("frmAppendRenameOverwrite"), button);
-        save();
-        QCOMPARE(readBytes(path("old.txt")), expected);
-        QCOMPARE(ws->state().fileExistsChoice, button.mid(3));
-    }
-
-    void fileExistsDialogTexts() {
-        QVERIFY(writeBytes(path("old.txt"), "old\n"));
-        ws->fill(kLog, ws->c().mnuLog);
-        ws->dialogs.answerSave(path("old.txt"));
         QStringList seen;
-        DialogDriver::whenModal(QStringLiteral("frmAppendRenameOverwrite"), [&seen](QWidget* d) {
+        DialogDriver::whenModal(QStringLiteral("frmAppendRenameOverwrite"), [&](QWidget* d) {
             seen << d->windowTitle() << d->findChild<QLabel*>(QStringLiteral("Label1"))->text();
             for (const char* b : {"cmdAppend", "cmdOverwrite", "cmdRename"})
                 seen << d->findChild<QPushButton*>(QLatin1String(b))->text();
-            DialogDriver::click(d, QStringLiteral("cmdOverwrite"));
+            DialogDriver::click(d, button);
         });
         save();
         QCOMPARE(seen, (QStringList{QString(),
                                     "The  file  you  specified  already  exists.    Please  "
                                     "select  one  of  the following  options.",
                                     "&Append", "&Overwrite", "&Rename"}));
+        QCOMPARE(readBytes(path("old.txt")), expected);
+        QCOMPARE(ws->state().fileExistsChoice, button.mid(3));
     }
 
     void failedWriteKeepsOldFile_data() {
