@@ -112,6 +112,15 @@ void MeterTest::scriptedRepliesAndFaults() {
     meter.setReplyDelayMs(0);
     meter.sendUnsolicited("\x81\xfe garbage");
     QCOMPARE(port.readLine(200), QByteArray("\x81\xfe garbage"));
+    meter.setBusyCount(2);
+    QCOMPARE(port.exchange("?S\r"), QByteArray("BUSY\r"));
+    QCOMPARE(port.exchange("?S\r"), QByteArray("BUSY\r"));
+    QCOMPARE(port.exchange("?S\r"), QByteArray("CD200 V1.21 012345 0003\r"));
+    // 25 bytes at 1200 baud take about 200 ms.
+    meter.setBaud(1200);
+    timer.restart();
+    QCOMPARE(port.exchange("?S\r"), QByteArray("CD200 V1.21 012345 0003\r"));
+    QVERIFY(timer.elapsed() >= 180);
 }
 
 void MeterTest::logWithAcksThenEnds() {
