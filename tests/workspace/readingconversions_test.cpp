@@ -21,101 +21,44 @@ void ReadingConversionsTest::convertsText_data() {
     QTest::addColumn<QString>("input");
     QTest::addColumn<QString>("expected");
 
-    QTest::newRow("1.413") << "m"
-                           << "ab 1.413mS/cm\n"
-                           << "ab  1413uS/cm\n";
-    QTest::newRow("1*413 no fraction left") << "m"
-                                            << "ab 1*413mS\n"
-                                            << "ab  1413uS\n";
-    QTest::newRow("12*345") << "m"
-                            << "ab12*345mS\n"
-                            << "ab 12345uS\n";
-    QTest::newRow("1*2345 keeps asterisk") << "m"
-                                           << "ab1*2345mS\n"
-                                           << "ab1234*5uS\n";
-    QTest::newRow("1234.5 over limit") << "m"
-                                       << "ab1234.5mS\n"
-                                       << "ab  +OVRuS\n";
-    QTest::newRow("999.99 under limit") << "m"
-                                        << "ab999.99mS\n"
-                                        << "ab999990uS\n";
-    QTest::newRow("1000 over limit") << "m"
-                                     << "ab  1000mS\n"
-                                     << "ab  +OVRuS\n";
-    QTest::newRow("dashes") << "m"
-                            << "ab ---.-mS\n"
-                            << "ab ---.-uS\n";
-    QTest::newRow("letters") << "m"
-                             << "abcdefghmS\n"
-                             << "abcdefghuS\n";
-    QTest::newRow("header word") << "m"
-                                 << "Cond mS/cm  Temp\n"
-                                 << "Cond uS/cm  Temp\n";
-    QTest::newRow("two numbers in field") << "m"
-                                          << "ab1 2 3 mS\n"
-                                          << "ab1 2 3 uS\n";
-    QTest::newRow("sign") << "m"
-                          << "ab +0.25mS\n"
-                          << "ab   250uS\n";
-    QTest::newRow("negative") << "m"
-                              << "ab -0.25mS\n"
-                              << "ab  -250uS\n";
-    QTest::newRow("rounding noise") << "m"
-                                    << "ab0.0013mS\n"
-                                    << "ab   1.3uS\n";
-    QTest::newRow("trailing blank") << "m"
-                                    << "ab 0.52 mS\n"
-                                    << "ab   520uS\n";
-    QTest::newRow("longer rendering overwrites") << "m"
-                                                 << "abc -100.0mS\n"
-                                                 << "abc-100000uS\n";
-    QTest::newRow("longer rendering stops at line") << "m"
-                                                    << "x\n-99999mS\n"
-                                                    << "x\n-99999uS\n";
-    QTest::newRow("units off") << ""
-                               << "ab 1.413mS 7*0ppK\n"
-                               << "ab 1.413mS 7*0ppK\n";
-    QTest::newRow("only ppK") << "p"
-                              << "ab 1.413mS  0.52ppK\n"
-                              << "ab 1.413mS   520ppM\n";
-    QTest::newRow("ppK asterisk") << "p"
-                                  << "ab 0*525ppK\n"
-                                  << "ab   525ppM\n";
-    QTest::newRow("ppK fraction asterisk") << "p"
-                                           << "ab1*2345ppK\n"
-                                           << "ab1234*5ppM\n";
-    QTest::newRow("asterisk pass last") << "ma"
-                                        << "ab1*2345mS 7*00\n"
-                                        << "ab1234.5uS 7.00\n";
-    QTest::newRow("asterisks only") << "a"
-                                    << "7*00 pH 1*413mS\n"
-                                    << "7.00 pH 1.413mS\n";
-    QTest::newRow("unit in first four") << "m"
-                                        << "1mS 2mS\n"
-                                        << "1mS 2uS\n";
-    QTest::newRow("short field at 5") << "m"
-                                      << "1.41mS\n"
-                                      << "1410uS\n";
-    QTest::newRow("short field at 6") << "m"
-                                      << "0.005mS\n"
-                                      << "    5uS\n";
-    QTest::newRow("short field too narrow") << "m"
-                                            << "12.5mS\n"
-                                            << "12.5uS\n";
-    QTest::newRow("unit at end") << "m"
-                                 << "ab 1.413mS"
-                                 << "ab  1413uS";
-    QTest::newRow("lone m at end") << "m"
-                                   << "ab 1.413m"
-                                   << "ab 1.413m";
-    QTest::newRow("empty") << "map"
-                           << ""
-                           << "";
-    QTest::newRow("many lines") << "mp"
-                                << "01/02/2024 10:00:00  1.413mS  0.70ppK\n"
-                                   "01/02/2024 10:00:01  1.414mS  0.71ppK\n"
-                                << "01/02/2024 10:00:00   1413uS   700ppM\n"
-                                   "01/02/2024 10:00:01   1414uS   710ppM\n";
+    auto row = [](const char* tag, const char* flags, const char* input, const char* expected) {
+        QTest::newRow(tag) << QString(flags) << QString(input) << QString(expected);
+    };
+    row("1.413", "m", "ab 1.413mS/cm\n", "ab  1413uS/cm\n");
+    row("1*413 no fraction left", "m", "ab 1*413mS\n", "ab  1413uS\n");
+    row("12*345", "m", "ab12*345mS\n", "ab 12345uS\n");
+    row("1*2345 keeps asterisk", "m", "ab1*2345mS\n", "ab1234*5uS\n");
+    row("1234.5 over limit", "m", "ab1234.5mS\n", "ab  +OVRuS\n");
+    row("999.99 under limit", "m", "ab999.99mS\n", "ab999990uS\n");
+    row("1000 over limit", "m", "ab  1000mS\n", "ab  +OVRuS\n");
+    row("dashes", "m", "ab ---.-mS\n", "ab ---.-uS\n");
+    row("letters", "m", "abcdefghmS\n", "abcdefghuS\n");
+    row("header word", "m", "Cond mS/cm  Temp\n", "Cond uS/cm  Temp\n");
+    row("two numbers in field", "m", "ab1 2 3 mS\n", "ab1 2 3 uS\n");
+    row("sign", "m", "ab +0.25mS\n", "ab   250uS\n");
+    row("negative", "m", "ab -0.25mS\n", "ab  -250uS\n");
+    row("rounding noise", "m", "ab0.0013mS\n", "ab   1.3uS\n");
+    row("trailing blank", "m", "ab 0.52 mS\n", "ab   520uS\n");
+    row("longer rendering overwrites", "m", "abc -100.0mS\n", "abc-100000uS\n");
+    row("longer rendering stops at line", "m", "x\n-99999mS\n", "x\n-99999uS\n");
+    row("units off", "", "ab 1.413mS 7*0ppK\n", "ab 1.413mS 7*0ppK\n");
+    row("only ppK", "p", "ab 1.413mS  0.52ppK\n", "ab 1.413mS   520ppM\n");
+    row("ppK asterisk", "p", "ab 0*525ppK\n", "ab   525ppM\n");
+    row("ppK fraction asterisk", "p", "ab1*2345ppK\n", "ab1234*5ppM\n");
+    row("asterisk pass last", "ma", "ab1*2345mS 7*00\n", "ab1234.5uS 7.00\n");
+    row("asterisks only", "a", "7*00 pH 1*413mS\n", "7.00 pH 1.413mS\n");
+    row("unit in first four", "m", "1mS 2mS\n", "1mS 2uS\n");
+    row("short field at 5", "m", "1.41mS\n", "1410uS\n");
+    row("short field at 6", "m", "0.005mS\n", "    5uS\n");
+    row("short field too narrow", "m", "12.5mS\n", "12.5uS\n");
+    row("unit at end", "m", "ab 1.413mS", "ab  1413uS");
+    row("lone m at end", "m", "ab 1.413m", "ab 1.413m");
+    row("empty", "map", "", "");
+    row("many lines", "mp",
+        "01/02/2024 10:00:00  1.413mS  0.70ppK\n"
+        "01/02/2024 10:00:01  1.414mS  0.71ppK\n",
+        "01/02/2024 10:00:00   1413uS   700ppM\n"
+        "01/02/2024 10:00:01   1414uS   710ppM\n");
 }
 
 void ReadingConversionsTest::convertsText() {
@@ -135,38 +78,25 @@ void ReadingConversionsTest::convertsValueField_data() {
     QTest::addColumn<QString>("field");
     QTest::addColumn<QString>("expected"); // "-" = not a number
 
-    QTest::newRow("exactly 999999") << "999.999"
-                                    << "999999";
-    QTest::newRow("just above") << "999.9991"
-                                << "+OVR";
-    QTest::newRow("zero") << "  0.00"
-                          << "0";
-    QTest::newRow("minus zero") << " -0.00"
-                                << "0";
-    QTest::newRow("point only") << "     ."
-                                << "-";
-    QTest::newRow("two points") << " 1.2.3"
-                                << "-";
-    QTest::newRow("two asterisks") << " 1*2*3"
-                                   << "-";
-    QTest::newRow("sign alone") << "     +"
-                                << "-";
-    QTest::newRow("sign then blank") << "  - 12"
-                                     << "-";
-    QTest::newRow("exponent") << "   1E2"
-                              << "-";
-    QTest::newRow("blanks") << "      "
-                            << "-";
-    QTest::newRow("line feed") << "\n12.34"
-                               << "-";
-    QTest::newRow("leading point") << "  .005"
-                                   << "5";
-    QTest::newRow("trailing point") << "   12."
-                                    << "12000";
-    QTest::newRow("small") << ".00001"
-                           << "0.01";
-    QTest::newRow("asterisk fraction") << "0*0005"
-                                       << "0*5";
+    auto row = [](const char* tag, const char* field, const char* expected) {
+        QTest::newRow(tag) << QString(field) << QString(expected);
+    };
+    row("exactly 999999", "999.999", "999999");
+    row("just above", "999.9991", "+OVR");
+    row("zero", "  0.00", "0");
+    row("minus zero", " -0.00", "0");
+    row("point only", "     .", "-");
+    row("two points", " 1.2.3", "-");
+    row("two asterisks", " 1*2*3", "-");
+    row("sign alone", "     +", "-");
+    row("sign then blank", "  - 12", "-");
+    row("exponent", "   1E2", "-");
+    row("blanks", "      ", "-");
+    row("line feed", "\n12.34", "-");
+    row("leading point", "  .005", "5");
+    row("trailing point", "   12.", "12000");
+    row("small", ".00001", "0.01");
+    row("asterisk fraction", "0*0005", "0*5");
 }
 
 void ReadingConversionsTest::convertsValueField() {
