@@ -20,39 +20,27 @@ private slots:
 void WorkspaceFilesTest::readsDelimitedFields_data() {
     QTest::addColumn<QString>("file");
     QTest::addColumn<QString>("expected");
-    QTest::newRow("comma starts new line") << "a,b\n"
-                                           << "a\nb\n";
-    QTest::newRow("leading blanks skipped") << "  lead\n\tx, y\n"
-                                            << "lead\nx\ny\n";
-    QTest::newRow("trailing blanks kept") << "trail  \n"
-                                          << "trail  \n";
-    QTest::newRow("quoted comma") << "\"q,uoted\",x\n"
-                                  << "q,uoted\nx\n";
-    QTest::newRow("quoted line break") << "\"multi\nline\"\n"
-                                       << "multi\nline\n";
-    QTest::newRow("quoted ends with line feed") << "\"ends\n\"\nz\n"
-                                                << "ends\nz\n";
-    QTest::newRow("after closing quote ignored") << "\"q\" junk,z"
-                                                 << "q\nz\n";
-    QTest::newRow("unclosed quote") << "\"unclosed, still\n"
-                                    << "unclosed, still\n";
-    QTest::newRow("comma before line end") << "a,\nb\n"
-                                           << "a\n\nb\n";
-    QTest::newRow("comma at end") << "a,"
-                                  << "a\n\n";
-    QTest::newRow("blank lines kept") << "\n\nb"
-                                      << "\n\nb\n";
-    QTest::newRow("CR LF") << "x\r\ny\r\n"
-                           << "x\ny\n";
-    QTest::newRow("CR only") << "x\ry"
-                             << "x\ny\n";
-    QTest::newRow("empty") << ""
-                           << "";
-    QTest::newRow("saved csv") << "Date Time,,\n01/02/2024 10:11:12,7.00,,25.0,\n"
-                               << "Date Time\n\n\n01/02/2024 10:11:12\n7.00\n\n25.0\n\n";
-    QTest::newRow("saved txt with header")
-        << "Date       Time      Reading\r\n01/02/2024 10:11:12   7.00 pH\n"
-        << "Date       Time      Reading\n01/02/2024 10:11:12   7.00 pH\n";
+    auto row = [](const char* tag, const char* file, const char* expected) {
+        QTest::newRow(tag) << QString(file) << QString(expected);
+    };
+    row("comma starts new line", "a,b\n", "a\nb\n");
+    row("leading blanks skipped", "  lead\n\tx, y\n", "lead\nx\ny\n");
+    row("trailing blanks kept", "trail  \n", "trail  \n");
+    row("quoted comma", "\"q,uoted\",x\n", "q,uoted\nx\n");
+    row("quoted line break", "\"multi\nline\"\n", "multi\nline\n");
+    row("quoted ends with line feed", "\"ends\n\"\nz\n", "ends\nz\n");
+    row("after closing quote ignored", "\"q\" junk,z", "q\nz\n");
+    row("unclosed quote", "\"unclosed, still\n", "unclosed, still\n");
+    row("comma before line end", "a,\nb\n", "a\n\nb\n");
+    row("comma at end", "a,", "a\n\n");
+    row("blank lines kept", "\n\nb", "\n\nb\n");
+    row("CR LF", "x\r\ny\r\n", "x\ny\n");
+    row("CR only", "x\ry", "x\ny\n");
+    row("empty", "", "");
+    row("saved csv", "Date Time,,\n01/02/2024 10:11:12,7.00,,25.0,\n",
+        "Date Time\n\n\n01/02/2024 10:11:12\n7.00\n\n25.0\n\n");
+    row("saved txt with header", "Date       Time      Reading\r\n01/02/2024 10:11:12   7.00 pH\n",
+        "Date       Time      Reading\n01/02/2024 10:11:12   7.00 pH\n");
 }
 
 void WorkspaceFilesTest::readsDelimitedFields() {
@@ -104,34 +92,23 @@ void WorkspaceFilesTest::finds_data() {
     QTest::addColumn<QString>("search");
     QTest::addColumn<int>("findStart");
     QTest::addColumn<int>("expected");
-    QTest::newRow("caret at start skips first") << "abcabc"
-                                                << "abc" << 2 << 4;
-    QTest::newRow("wrap to position 1") << "abcxyz"
-                                        << "abc" << 2 << 1;
-    QTest::newRow("wrap includes findStart") << "xabc"
-                                             << "abc" << 2 << 2;
-    QTest::newRow("wrap stops at findStart") << "xyabc"
-                                             << "ab" << 4 << 3;
-    QTest::newRow("case ignored") << "Cond MS/CM"
-                                  << "ms/cm" << 1 << 6;
-    QTest::newRow("Latin-1 case") << QString::fromLatin1("temp \xC9t\xE9")
-                                  << QString::fromLatin1("\xE9T\xC9") << 1 << 6;
-    QTest::newRow("overlapping") << "aaaa"
-                                 << "aa" << 3 << 3;
-    QTest::newRow("next after last wraps") << "ab ab"
-                                           << "ab" << 5 << 1;
-    QTest::newRow("not found") << "abc"
-                               << "zz" << 2 << 0;
-    QTest::newRow("start 1 no wrap") << "abc"
-                                     << "zz" << 1 << 0;
-    QTest::newRow("start beyond end") << "abc"
-                                      << "b" << 10 << 2;
-    QTest::newRow("empty search") << "abc"
-                                  << "" << 1 << 0;
-    QTest::newRow("empty text") << ""
-                                << "a" << 1 << 0;
-    QTest::newRow("longer than text") << "ab"
-                                      << "abc" << 1 << 0;
+    auto row = [](const char* tag, const QString& text, const QString& search, int findStart,
+                  int expected) { QTest::newRow(tag) << text << search << findStart << expected; };
+    row("caret at start skips first", "abcabc", "abc", 2, 4);
+    row("wrap to position 1", "abcxyz", "abc", 2, 1);
+    row("wrap includes findStart", "xabc", "abc", 2, 2);
+    row("wrap stops at findStart", "xyabc", "ab", 4, 3);
+    row("case ignored", "Cond MS/CM", "ms/cm", 1, 6);
+    row("Latin-1 case", QString::fromLatin1("temp \xC9t\xE9"), QString::fromLatin1("\xE9T\xC9"), 1,
+        6);
+    row("overlapping", "aaaa", "aa", 3, 3);
+    row("next after last wraps", "ab ab", "ab", 5, 1);
+    row("not found", "abc", "zz", 2, 0);
+    row("start 1 no wrap", "abc", "zz", 1, 0);
+    row("start beyond end", "abc", "b", 10, 2);
+    row("empty search", "abc", "", 1, 0);
+    row("empty text", "", "a", 1, 0);
+    row("longer than text", "ab", "abc", 1, 0);
 }
 
 void WorkspaceFilesTest::finds() {
