@@ -22,30 +22,21 @@ private slots:
 void ModelTableTest::k5Normalisation_data() {
     QTest::addColumn<QString>("word");
     QTest::addColumn<QString>("code");
-    QTest::newRow("K5AC") << "K5AC"
-                          << "K5AC";
-    QTest::newRow("K5AC suffix") << "K5AC12"
-                                 << "K5AC";
-    QTest::newRow("K5ACMV beats K5AC") << "K5ACMV"
-                                       << "K5ACMV";
-    QTest::newRow("K5AD") << "K5AD"
-                          << "K5ACMV";
-    QTest::newRow("K5E") << "K5E1"
-                         << "K5E";
-    QTest::newRow("K5G") << "K5G"
-                         << "K5G";
-    QTest::newRow("K5GJ beats K5G") << "K5GJ7"
-                                    << "K5GJ";
-    QTest::newRow("K5AH") << "K5AHX"
-                          << "K5AH";
-    QTest::newRow("K5J") << "K5J"
-                         << "K5J";
-    QTest::newRow("lower case not normalised") << "k5ac"
-                                               << "k5ac";
-    QTest::newRow("unknown kept") << "K5Z9"
-                                  << "K5Z9";
-    QTest::newRow("empty") << ""
-                           << "";
+    auto row = [](const char* tag, const char* word, const char* code) {
+        QTest::newRow(tag) << QString(word) << QString(code);
+    };
+    row("K5AC", "K5AC", "K5AC");
+    row("K5AC suffix", "K5AC12", "K5AC");
+    row("K5ACMV beats K5AC", "K5ACMV", "K5ACMV");
+    row("K5AD", "K5AD", "K5ACMV");
+    row("K5E", "K5E1", "K5E");
+    row("K5G", "K5G", "K5G");
+    row("K5GJ beats K5G", "K5GJ7", "K5GJ");
+    row("K5AH", "K5AHX", "K5AH");
+    row("K5J", "K5J", "K5J");
+    row("lower case not normalised", "k5ac", "k5ac");
+    row("unknown kept", "K5Z9", "K5Z9");
+    row("empty", "", "");
 }
 
 void ModelTableTest::k5Normalisation() {
@@ -64,35 +55,31 @@ void ModelTableTest::modelFacts_data() {
     QTest::addColumn<int>("minimum");
     QTest::addColumn<QString>("enableLoggingPlain");
 
-    QTest::newRow("K5AC") << "K5AC" << true << true << true << false << false << false << 0 << "?G";
-    QTest::newRow("K5AH") << "K5AH" << true << true << true << false << false << false << 0 << "?J";
-    QTest::newRow("K5AHX is not K5AH")
-        << "K5AHX" << true << true << true << false << false << false << 0 << "?G";
-    QTest::newRow("K51") << "K51" << false << false << false << false << false << false << 0
-                         << "?G";
-    QTest::newRow("K51 longer") << "K51B" << false << false << false << false << false << false << 0
-                                << "?G";
-    QTest::newRow("K50") << "K50" << false << true << true << false << false << false << 0 << "?G";
-    QTest::newRow("K50V3") << "K50V3" << false << true << true << false << false << false << 2
-                           << "?G";
-    QTest::newRow("K50V3 longer") << "K50V35" << false << true << true << false << false << false
-                                  << 0 << "?G";
-    QTest::newRow("LXT anywhere") << "AB-LXT9" << false << true << true << false << false << false
-                                  << 2 << "?G";
-    QTest::newRow("LXT any case") << "lxt" << false << true << true << false << false << false << 2
-                                  << "?G";
-    QTest::newRow("QR32") << "QR32" << false << true << false << true << true << false << 0 << "?G";
-    QTest::newRow("ZUM410") << "ZUM410" << false << true << true << true << false << false << 0
-                            << "?G";
-    QTest::newRow("QR32 longer") << "QR321" << false << true << true << false << false << false << 0
-                                 << "?G";
-    QTest::newRow("QR34 longer") << "QR34ZZ" << false << true << true << false << false << true << 0
-                                 << "?G";
-    QTest::newRow("qr34 lower") << "qr34" << false << true << true << false << false << false << 0
-                                << "?G";
-    QTest::newRow("k5 lower") << "k5ac" << false << true << true << false << false << false << 0
-                              << "?G";
-    QTest::newRow("empty") << "" << false << true << true << false << false << false << 0 << "?G";
+    // Flags in column order: k5, plainLog, plainGlp, qr32Status, qr32Layout, maxMin.
+    auto row = [](const char* tag, const char* code, const char* flags, int minimum,
+                  const char* enableLogging) {
+        auto& data = QTest::newRow(tag) << QString(code);
+        for (int i = 0; i < 6; ++i)
+            data << (flags[i] == '1');
+        data << minimum << QString(enableLogging);
+    };
+    row("K5AC", "K5AC", "111000", 0, "?G");
+    row("K5AH", "K5AH", "111000", 0, "?J");
+    row("K5AHX is not K5AH", "K5AHX", "111000", 0, "?G");
+    row("K51", "K51", "000000", 0, "?G");
+    row("K51 longer", "K51B", "000000", 0, "?G");
+    row("K50", "K50", "011000", 0, "?G");
+    row("K50V3", "K50V3", "011000", 2, "?G");
+    row("K50V3 longer", "K50V35", "011000", 0, "?G");
+    row("LXT anywhere", "AB-LXT9", "011000", 2, "?G");
+    row("LXT any case", "lxt", "011000", 2, "?G");
+    row("QR32", "QR32", "010110", 0, "?G");
+    row("ZUM410", "ZUM410", "011100", 0, "?G");
+    row("QR32 longer", "QR321", "011000", 0, "?G");
+    row("QR34 longer", "QR34ZZ", "011001", 0, "?G");
+    row("qr34 lower", "qr34", "011000", 0, "?G");
+    row("k5 lower", "k5ac", "011000", 0, "?G");
+    row("empty", "", "011000", 0, "?G");
 }
 
 void ModelTableTest::modelFacts() {
