@@ -42,36 +42,24 @@ void ProfilesTest::statusParses_data() {
     QTest::addColumn<int>("logged"); // -1: the reply carries no count
     QTest::addColumn<bool>("hasLog");
     QTest::addColumn<bool>("hasGlp");
-    QTest::newRow("plain") << "plain"
-                           << "CD200" << 42 << true << true;
-    QTest::newRow("k50") << "k50"
-                         << "K50" << 42 << true << true;
-    QTest::newRow("k50v3") << "k50v3"
-                           << "K50V3" << 42 << true << true;
-    QTest::newRow("lxt") << "lxt"
-                         << "LXT200" << 42 << true << true;
-    QTest::newRow("k51") << "k51"
-                         << "K51" << -1 << false << false;
-    QTest::newRow("k5ac") << "k5ac"
-                          << "K5AC" << 42 << true << false;
-    QTest::newRow("k5acmv") << "k5acmv"
-                            << "K5ACMV" << 42 << true << false;
-    QTest::newRow("k5ad") << "k5ad"
-                          << "K5ACMV" << 42 << true << false;
-    QTest::newRow("k5gj") << "k5gj"
-                          << "K5GJ" << 42 << true << false;
-    QTest::newRow("k5ah") << "k5ah"
-                          << "K5AH" << 42 << true << true;
-    QTest::newRow("percent-log") << "percent-log"
-                                 << "CP600" << 42 << true << false;
-    QTest::newRow("percent-nolog") << "percent-nolog"
-                                   << "CP500" << -1 << false << false;
-    QTest::newRow("qr32") << "qr32"
-                          << "QR32" << 42 << true << false;
-    QTest::newRow("zum410") << "zum410"
-                            << "QR32" << 42 << true << false;
-    QTest::newRow("qr34") << "qr34"
-                          << "QR34A" << 42 << true << true;
+    auto row = [](const char* name, const char* model, int logged, bool hasLog, bool hasGlp) {
+        QTest::newRow(name) << QString(name) << QString(model) << logged << hasLog << hasGlp;
+    };
+    row("plain", "CD200", 42, true, true);
+    row("k50", "K50", 42, true, true);
+    row("k50v3", "K50V3", 42, true, true);
+    row("lxt", "LXT200", 42, true, true);
+    row("k51", "K51", -1, false, false);
+    row("k5ac", "K5AC", 42, true, false);
+    row("k5acmv", "K5ACMV", 42, true, false);
+    row("k5ad", "K5ACMV", 42, true, false);
+    row("k5gj", "K5GJ", 42, true, false);
+    row("k5ah", "K5AH", 42, true, true);
+    row("percent-log", "CP600", 42, true, false);
+    row("percent-nolog", "CP500", -1, false, false);
+    row("qr32", "QR32", 42, true, false);
+    row("zum410", "QR32", 42, true, false);
+    row("qr34", "QR34A", 42, true, true);
 }
 
 void ProfilesTest::statusParses() {
