@@ -155,28 +155,21 @@ private slots:
         QTest::addColumn<bool>("saved");
         QTest::addColumn<bool>("empty");
         QTest::addColumn<bool>("asks");
-        QTest::newRow("real-time, exit") << "mnuRealTime"
-                                         << "" << false << false << true;
-        QTest::newRow("listen, exit") << "mnuListen"
-                                      << "" << false << false << true;
-        QTest::newRow("log, exit") << "mnuLog"
-                                   << "" << false << false << false;
-        QTest::newRow("glp, exit") << "mnuGLP"
-                                   << "" << false << false << false;
-        QTest::newRow("opened file") << ""
-                                     << "" << false << false << false;
-        QTest::newRow("real-time saved") << "mnuRealTime"
-                                         << "" << true << false << false;
-        QTest::newRow("real-time empty") << "mnuRealTime"
-                                         << "" << false << true << false;
-        QTest::newRow("real-time then real-time") << "mnuRealTime"
-                                                  << "RealTime" << false << false << false;
-        QTest::newRow("real-time then listen") << "mnuRealTime"
-                                               << "Listen" << false << false << true;
-        QTest::newRow("listen then listen") << "mnuListen"
-                                            << "Listen" << false << false << false;
-        QTest::newRow("listen then real-time") << "mnuListen"
-                                               << "RealTime" << false << false << true;
+        auto row = [](const char* tag, const char* kind, const char* mode, bool saved, bool empty,
+                      bool asks) {
+            QTest::newRow(tag) << QString(kind) << QString(mode) << saved << empty << asks;
+        };
+        row("real-time, exit", "mnuRealTime", "", false, false, true);
+        row("listen, exit", "mnuListen", "", false, false, true);
+        row("log, exit", "mnuLog", "", false, false, false);
+        row("glp, exit", "mnuGLP", "", false, false, false);
+        row("opened file", "", "", false, false, false);
+        row("real-time saved", "mnuRealTime", "", true, false, false);
+        row("real-time empty", "mnuRealTime", "", false, true, false);
+        row("real-time then real-time", "mnuRealTime", "RealTime", false, false, false);
+        row("real-time then listen", "mnuRealTime", "Listen", false, false, true);
+        row("listen then listen", "mnuListen", "Listen", false, false, false);
+        row("listen then real-time", "mnuListen", "RealTime", false, false, true);
     }
     void savePromptRules() {
         QFETCH(QString, kind);
