@@ -34,9 +34,11 @@ class EditFindTest : public QObject {
         const QTextCursor cur = ws->edit()->textCursor();
         return {cur.selectionStart(), cur.selectionEnd() - cur.selectionStart()};
     }
-    void placeCaret(int pos) {
+    void placeCaret(int pos) { select(pos, pos); }
+    void select(int from, int to) {
         QTextCursor cur = ws->edit()->textCursor();
-        cur.setPosition(pos);
+        cur.setPosition(from);
+        cur.setPosition(to, QTextCursor::KeepAnchor);
         ws->edit()->setTextCursor(cur);
     }
     bool contextMenuShows() {
@@ -141,10 +143,7 @@ private slots:
         c().mnuSelectAll->trigger();
         QVERIFY(!c().mnuSelectAll->isEnabled());
         QVERIFY(c().mnuCopy->isEnabled());
-        QTextCursor cur = ws->edit()->textCursor();
-        cur.setPosition(1);
-        cur.setPosition(5, QTextCursor::KeepAnchor);
-        ws->edit()->setTextCursor(cur);
+        select(1, 5);
         QVERIFY(c().mnuSelectAll->isEnabled());
         QVERIFY(c().mnuCopy->isEnabled());
         c().mnuCopy->trigger();
@@ -197,10 +196,7 @@ private slots:
 
     void findTakesSelectionAndKeepsTextWhenClosed() {
         ws->fill(QStringLiteral("one two one\n"), c().mnuLog);
-        QTextCursor cur = ws->edit()->textCursor();
-        cur.setPosition(4);
-        cur.setPosition(7, QTextCursor::KeepAnchor);
-        ws->edit()->setTextCursor(cur);
+        select(4, 7);
         c().mnuFind->trigger();
         QCOMPARE(findText()->text(), QStringLiteral("two"));
         QCOMPARE(findText()->selectedText(), QStringLiteral("two"));
