@@ -40,24 +40,17 @@ void HelpCommandsTest::itemsOpenTheirWindows_data() {
     QTest::addColumn<QString>("dialog");
     QTest::addColumn<QString>("caption");
     QTest::addColumn<bool>("stopsVoltage");
-    QTest::newRow("Help (General)") << "mnuHelpGeneral"
-                                    << "frmHelp"
-                                    << "  Help  (General)" << true;
-    QTest::newRow("Help button") << "cmdHelp"
-                                 << "frmHelp"
-                                 << "  Help  (General)" << true;
-    QTest::newRow("Help (Other)") << "mnuK5help"
-                                  << "frmK5Help"
-                                  << "  Help  (Other)" << true;
-    QTest::newRow("About KVO") << "mnuAboutKVO"
-                               << "frmAboutKVO"
-                               << " About  KVO" << true;
-    QTest::newRow("About Telvio") << "mnuAboutTelvio"
-                                  << "frmAboutTelvio"
-                                  << "About Telvio" << false;
-    QTest::newRow("Browse Catalogue, no CD") << "mnuCatalog"
-                                             << "frmCatalog"
-                                             << "  Catalogue" << true;
+    auto row = [](const char* tag, const char* control, const char* dialog, const char* caption,
+                  bool stopsVoltage) {
+        QTest::newRow(tag) << QString(control) << QString(dialog) << QString(caption)
+                           << stopsVoltage;
+    };
+    row("Help (General)", "mnuHelpGeneral", "frmHelp", "  Help  (General)", true);
+    row("Help button", "cmdHelp", "frmHelp", "  Help  (General)", true);
+    row("Help (Other)", "mnuK5help", "frmK5Help", "  Help  (Other)", true);
+    row("About KVO", "mnuAboutKVO", "frmAboutKVO", " About  KVO", true);
+    row("About Telvio", "mnuAboutTelvio", "frmAboutTelvio", "About Telvio", false);
+    row("Browse Catalogue, no CD", "mnuCatalog", "frmCatalog", "  Catalogue", true);
 }
 
 void HelpCommandsTest::itemsOpenTheirWindows() {
