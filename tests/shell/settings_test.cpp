@@ -58,21 +58,17 @@ private slots:
         QTest::addColumn<QString>("key");
         QTest::addColumn<QString>("value");
         QTest::addColumn<bool>("loads");
-        QTest::newRow("empty baud") << "Baud"
-                                    << "" << false;
-        QTest::newRow("huge baud") << "Baud"
-                                   << "99999999999999" << false;
-        QTest::newRow("negative baud") << "Baud"
-                                       << "-5" << true;
-        QTest::newRow("infinite interval") << "LogInvterval"
-                                           << "1e999" << false;
-        QTest::newRow("text interval") << "LogInvterval"
-                                       << "soon" << false;
-        QTest::newRow("16-bit overflow") << "Asterisk"
-                                         << "70000" << false;
-        QTest::newRow("long drive") << "Drive" << QString(100000, QLatin1Char('x')) << true;
-        QTest::newRow("blanks around") << "Baud"
-                                       << " 19200 " << true;
+        auto row = [](const char* tag, const char* key, const QString& value, bool loads) {
+            QTest::newRow(tag) << QString(key) << value << loads;
+        };
+        row("empty baud", "Baud", "", false);
+        row("huge baud", "Baud", "99999999999999", false);
+        row("negative baud", "Baud", "-5", true);
+        row("infinite interval", "LogInvterval", "1e999", false);
+        row("text interval", "LogInvterval", "soon", false);
+        row("16-bit overflow", "Asterisk", "70000", false);
+        row("long drive", "Drive", QString(100000, QLatin1Char('x')), true);
+        row("blanks around", "Baud", " 19200 ", true);
     }
     void badValuesNeverCrash() {
         QFETCH(QString, key);
@@ -90,14 +86,13 @@ private slots:
     void writesBackWhatItRead_data() {
         QTest::addColumn<QString>("baud");
         QTest::addColumn<QString>("interval");
-        QTest::newRow("defaults") << "9600"
-                                  << "1";
-        QTest::newRow("half second") << "19200"
-                                     << "0.5";
-        QTest::newRow("thirty") << "1200"
-                                << "30";
-        QTest::newRow("hour") << "38400"
-                              << "3600";
+        auto row = [](const char* tag, const char* baud, const char* interval) {
+            QTest::newRow(tag) << QString(baud) << QString(interval);
+        };
+        row("defaults", "9600", "1");
+        row("half second", "19200", "0.5");
+        row("thirty", "1200", "30");
+        row("hour", "38400", "3600");
     }
     void writesBackWhatItRead() {
         QFETCH(QString, baud);
