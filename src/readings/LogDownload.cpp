@@ -81,16 +81,21 @@ void LogDownload::showProgress(long long count) {
     }
 }
 
+bool LogDownload::sendRequest(const QString& command) {
+    Exchange& exchange = w_.exchange();
+    exchange.FlushInput();
+    if (s_.abortRequested)
+        return false;
+    s_.commandText = command;
+    exchange.SerialWrite(s_.commandText);
+    return !s_.abortRequested;
+}
+
 LogDownload::End LogDownload::generalProtocol() {
     Exchange& exchange = w_.exchange();
     Exchange::Scope busy(exchange);
     const LineLayout layout = LineLayout::fromState(s_);
-    exchange.FlushInput();
-    if (s_.abortRequested)
-        return End::LinkFailed;
-    s_.commandText = QStringLiteral("?L\r");
-    exchange.SerialWrite(s_.commandText);
-    if (s_.abortRequested)
+    if (!sendRequest(QStringLiteral("?L\r")))
         return End::LinkFailed;
 
     long long count = 0;
@@ -126,12 +131,7 @@ LogDownload::End LogDownload::generalProtocol() {
 LogDownload::End LogDownload::qr32Protocol() {
     Exchange& exchange = w_.exchange();
     Exchange::Scope busy(exchange);
-    exchange.FlushInput();
-    if (s_.abortRequested)
-        return End::LinkFailed;
-    s_.commandText = QStringLiteral("?R\r");
-    exchange.SerialWrite(s_.commandText);
-    if (s_.abortRequested)
+    if (!sendRequest(QStringLiteral("?R\r")))
         return End::LinkFailed;
 
     // Exactly numLogged records, no acknowledgement and no end marker.

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <QString>
+
 class MainWindow;
 struct AppState;
 
@@ -20,6 +22,8 @@ private:
     };
 
     void enterDownloadState();
+    // Drains the line and writes the request; false when the link failed.
+    bool sendRequest(const QString& command);
     End generalProtocol();
     End qr32Protocol();
     // ProgressBar1 in twentieths of numLogged; repainted only when it moves.

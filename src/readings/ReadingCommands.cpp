@@ -66,12 +66,16 @@ void ReadingCommands::connectControls() {
 
 void ReadingCommands::GetHeaderAndPosition() {
     Exchange& exchange = w_.exchange();
-    if (!exchange.ExchangeCommand(QStringLiteral("?H")))
-        return;
-    if (replywords::unusable(s_.responseText)) {
+    // An unusable reply leaves no header and no Log# column.
+    auto forgetHeader = [this] {
         s_.headerText.clear();
         s_.positionText.clear();
         logColumnKnown_ = false;
+    };
+    if (!exchange.ExchangeCommand(QStringLiteral("?H")))
+        return;
+    if (replywords::unusable(s_.responseText)) {
+        forgetHeader();
         return;
     }
     s_.headerText = HeaderPosition::headerFor(s_.responseText, s_.hasLog);
@@ -79,9 +83,7 @@ void ReadingCommands::GetHeaderAndPosition() {
     if (!exchange.ExchangeCommand(QStringLiteral("?P")))
         return;
     if (replywords::unusable(s_.responseText)) {
-        s_.headerText.clear();
-        s_.positionText.clear();
-        logColumnKnown_ = false;
+        forgetHeader();
         return;
     }
     s_.positionText = s_.responseText;
