@@ -91,6 +91,17 @@ bool LogDownload::sendRequest(const QString& command) {
     return !s_.abortRequested;
 }
 
+std::optional<LogDownload::End> LogDownload::readRecord(long long progressCount) {
+    showProgress(progressCount);
+    w_.exchange().SendCommand();
+    if (s_.abortRequested)
+        return End::LinkFailed;
+    if (replywords::unusable(s_.responseText))
+        return End::ReplyFailed;
+    s_.dataLine = s_.responseText;
+    return std::nullopt;
+}
+
 LogDownload::End LogDownload::generalProtocol() {
     Exchange& exchange = w_.exchange();
     Exchange::Scope busy(exchange);
@@ -101,13 +112,8 @@ LogDownload::End LogDownload::generalProtocol() {
     long long count = 0;
     lastProgress_ = 0;
     for (;;) {
-        showProgress(count);
-        exchange.SendCommand();
-        if (s_.abortRequested)
-            return End::LinkFailed;
-        if (replywords::unusable(s_.responseText))
-            return End::ReplyFailed;
-        s_.dataLine = s_.responseText;
+        if (const auto failed = readRecord(count))
+            return *failed;
         // Every record is acknowledged, the "ENDS" line too.
         exchange.SerialWrite(QStringLiteral("A"));
         if (s_.abortRequested)
@@ -138,13 +144,8 @@ LogDownload::End LogDownload::qr32Protocol() {
     const long long total = s_.numLogged;
     lastProgress_ = 0;
     for (long long i = 1; i <= total; ++i) {
-        showProgress(i);
-        exchange.SendCommand();
-        if (s_.abortRequested)
-            return End::LinkFailed;
-        if (replywords::unusable(s_.responseText))
-            return End::ReplyFailed;
-        s_.dataLine = s_.responseText;
+        if (const auto failed = readRecord(i))
+            return *failed;
         const auto line = LogLineFormat::qr32Record(s_.dataLine);
         if (!line)
             return End::LinkFailed;

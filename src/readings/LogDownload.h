@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QString>
+#include <optional>
 
 class MainWindow;
 struct AppState;
@@ -24,6 +25,8 @@ private:
     void enterDownloadState();
     // Drains the line and writes the request; false when the link failed.
     bool sendRequest(const QString& command);
+    // Reads one record into dataLine; the way the download ends when it could not.
+    std::optional<End> readRecord(long long progressCount);
     End generalProtocol();
     End qr32Protocol();
     // ProgressBar1 in twentieths of numLogged; repainted only when it moves.
