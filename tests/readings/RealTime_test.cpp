@@ -345,20 +345,23 @@ void RealTimeTest::meterLost() {
 void RealTimeTest::acrossMidnight() {
     WindowFixture fx;
     QVERIFY(fx.startDetected(QStringLiteral("percent-nolog")));
-    const QDateTime now = fx.clock.wallNow();
-    const QDateTime beforeMidnight(now.date(), QTime(23, 59, 59, 500));
-    fx.clock.setWallShift(now.secsTo(beforeMidnight));
     fx.meter->setReadingReplies({"  7.00   1.413mS\r"});
     startRealTime(fx, "1");
+    // Only the wall clock jumps, to just after midnight at the second reading's due time; the
+    // schedule runs on the monotonic clock and must not notice.
+    const AppState& s = fx.state();
+    const double remaining = s.runStartTime + s.logInterval - fx.clock.nowSeconds();
+    const QDateTime atDue = fx.clock.wallNow().addMSecs(qint64(remaining * 1000));
+    const QDate nextDay = atDue.date().addDays(1);
+    fx.clock.setWallShift(atDue.secsTo(QDateTime(nextDay, QTime(0, 0))) + 1);
     fireReading(fx);
 
     const QStringList l = lines(fx.state().workspaceText);
     QCOMPARE(l.size(), 2);
-    const QDate day = beforeMidnight.date();
-    QCOMPARE(l[0], day.toString(QStringLiteral("dd/MM/yyyy")) + QStringLiteral(" 23:59:59    1 ") +
-                       QStringLiteral("  7.00   1.413mS\r"));
-    QCOMPARE(l[1].left(25), day.addDays(1).toString(QStringLiteral("dd/MM/yyyy")) +
-                                QStringLiteral(" 00:00:00    2 "));
+    QCOMPARE(l[0].mid(19, 6), QStringLiteral("    1 "));
+    QCOMPARE(l[1].left(31), nextDay.toString(QStringLiteral("dd/MM/yyyy")) +
+                                QStringLiteral(" 00:00:0") + l[1].mid(18, 1) +
+                                QStringLiteral("    2   7.00"));
     // The schedule is unaffected: the third reading is due one second after the second.
     QVERIFY(armedForDueTime(fx, 1000));
     QVERIFY(fx.state().headerText.startsWith(QStringLiteral("   Date      Time   Log# ")));
