@@ -24,12 +24,14 @@ void HelpCommands::mnuHelpGeneral_Click() {
     w_.StopVoltageDisplay();
     HelpWindow help(HelpKind::General, w_.state(), w_.prompts(), w_.dialogs(), programFolder(),
                     &w_);
+    help.usePrinter(&w_.printer());
     help.exec();
 }
 
 void HelpCommands::mnuK5help_Click() {
     w_.StopVoltageDisplay();
     HelpWindow help(HelpKind::Other, w_.state(), w_.prompts(), w_.dialogs(), programFolder(), &w_);
+    help.usePrinter(&w_.printer());
     help.exec();
 }
 

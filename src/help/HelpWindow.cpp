@@ -156,7 +156,8 @@ void HelpWindow::HelpSelect(int index) {
 }
 
 void HelpWindow::PrintHelpFile() {
-    QPrinter printer;
+    QPrinter own;
+    QPrinter& printer = printer_ ? *printer_ : own;
     if (!dialogs_.askPrinter(this, printer))
         return;
     // A hidden document of its own: the window keeps showing its topic.

@@ -9,6 +9,7 @@ struct AppState;
 class Prompts;
 class PlatformDialogs;
 class QLabel;
+class QPrinter;
 class QTextEdit;
 
 // The help windows: frmHelp (general help, 13 topics) and frmK5Help (the commands of other
@@ -30,6 +31,8 @@ public:
     void HelpSelect(int index);
     // Prints every topic except the print and exit ones, through the print dialog.
     void PrintHelpFile();
+    // The printer chosen in Print Setup; without one, each print starts from a new printer.
+    void usePrinter(QPrinter* printer) { printer_ = printer; }
 
     HelpKind kind() const { return kind_; }
     int selectedTopic() const { return selectedTopic_; }
@@ -58,6 +61,7 @@ private:
     QList<QLabel*> arrows_;
     QTextEdit* text_ = nullptr;
     QLabel* print_ = nullptr;
+    QPrinter* printer_ = nullptr;
     int selectedTopic_ = 0; // moved by the keys only
     int shownTopic_ = 0;
 };

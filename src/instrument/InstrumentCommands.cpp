@@ -8,6 +8,7 @@
 #include "shell/MainWindow.h"
 #include "shell/Prompts.h"
 #include "shell/Twips.h"
+#include "workspace/WindowLayout.h"
 
 #include <QAction>
 #include <QLabel>
@@ -164,6 +165,7 @@ void InstrumentCommands::DisplayPercentStatus(const StatusReply& reply) {
         MainWindow::setTopTwips(c.lblHeader, 1210);
         placeWorkspace(1420, 2510 + 340);
     }
+    WindowLayout::placeBelowHeader(c);
     c.mnuVoltage->setVisible(reply.reportsVoltage());
     finishDisplay();
     warnIfBatteryLow();

@@ -63,7 +63,7 @@ bool matches(const ModelRule& rule, const QString& code) {
     case Match::BeginsWith:
         return code.startsWith(text);
     case Match::Contains:
-        return code.contains(text, Qt::CaseInsensitive);
+        return code.contains(text);
     }
     return false;
 }

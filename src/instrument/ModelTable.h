@@ -6,7 +6,7 @@
 // The status display, the log download and real-time readings ask these functions instead of
 // comparing model codes themselves.
 //
-// Comparison rules: "contains" ignores letter case; "begins with" and equality are exact.
+// Model codes are compared exactly, letter case included: "contains", "begins with" and equality.
 namespace modeltable {
 
 // The status reply (or a model code) belongs to the K5 family: it begins with "K5" but not with

@@ -155,11 +155,9 @@ StatusReply parseStatusReply(const QString& reply, const QString& currentModelCo
 }
 
 void parseVersionReply(const QString& reply, StatusReply& status) {
-    if (reply.size() < 18) {
-        status.firmwareVersion = QString();
-        status.serialNumber = QString();
-        return;
-    }
-    status.firmwareVersion = reply.mid(8, 3);
-    status.serialNumber = reply.mid(12, 6);
+    // Each field is taken when all its characters are there, so a short reply keeps what it has.
+    if (reply.size() >= 11)
+        status.firmwareVersion = reply.mid(8, 3);
+    if (reply.size() >= 18)
+        status.serialNumber = reply.mid(12, 6);
 }

@@ -51,7 +51,7 @@ private:
 StatusReply parseStatusReply(const QString& reply, const QString& currentModelCode);
 
 // Fills version (characters 9-11) and serial number (characters 13-18) of a QR32-layout meter
-// from its reply to "?W". A reply shorter than 18 characters yields empty fields.
+// from its reply to "?W". A field whose characters are not all there is not delivered.
 void parseVersionReply(const QString& reply, StatusReply& status);
 
 // The number of a count field: decimal digits only (spaces around them allowed), within range.

@@ -78,7 +78,7 @@ void Exchange::ReadReply() {
     }
 }
 
-void Exchange::FlushInput() {
+Exchange::Drain Exchange::FlushInput() {
     Scope busy(*this);
     s_.responseText = QStringLiteral("\n");
     s_.readTimeoutSec = 0.15;
@@ -88,17 +88,17 @@ void Exchange::FlushInput() {
         if (s_.responseText.isEmpty()) {
             s_.flushing = false;
             s_.readTimeoutSec = 1.5;
-            return;
+            return Drain::Quiet;
         }
         SerialWrite(QStringLiteral("\n"));
         if (s_.abortRequested)
-            return;
+            return Drain::Failed;
         ReadReply();
         if (s_.abortRequested)
-            return;
+            return Drain::Failed;
         if (++count > 40) {
             s_.abortRequested = true;
-            return;
+            return Drain::KeptSending;
         }
     }
 }

@@ -17,7 +17,10 @@ public:
     static constexpr int kMaxReplyLength = 4096;
     static QString wakeUpCommand(); // 24 x "{@", then "?S" and CR
 
-    void FlushInput();
+    // How a drain ended. A meter that never went quiet and a failed link both set
+    // abortRequested; a caller that can live with a meter still sending tells them apart here.
+    enum class Drain { Quiet, KeptSending, Failed };
+    Drain FlushInput();
     void SendCommand();
     void ReadReply();
     void ResetLink();

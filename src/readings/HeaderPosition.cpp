@@ -21,7 +21,7 @@ bool numberField(const QString& text, int& value) {
 HeaderPosition::LogColumn HeaderPosition::findLogColumn(const QString& header,
                                                         const QString& position) {
     LogColumn column;
-    const qsizetype j = header.indexOf(QLatin1String("Log"), 0, Qt::CaseInsensitive);
+    const qsizetype j = header.indexOf(QLatin1String("Log"));
     if (j < 0)
         return column;
 

@@ -19,9 +19,9 @@ public:
         int width = 0;
     };
 
-    // The header's columns are counted up to the one holding "Log" (k columns); the position
-    // reply is a count followed by a start,width pair per column, so the Log# column's start is
-    // the field after 2k - 1 commas and its width the field after that. A header without "Log"
-    // or a reply with too few fields gives found = false.
+    // The header's columns are counted up to the one holding "Log", letter case included
+    // (k columns); the position reply is a count followed by a start,width pair per column, so
+    // the Log# column's start is the field after 2k - 1 commas and its width the field after
+    // that. A header without "Log" or a reply with too few fields gives found = false.
     static LogColumn findLogColumn(const QString& header, const QString& position);
 };

@@ -39,8 +39,12 @@ void ListenMode::ListenForData() {
     s_.runActive = true;
     s_.workspaceSaved = false;
 
-    w_.exchange().FlushInput();
-    if (s_.abortRequested) {
+    if (w_.exchange().FlushInput() == Exchange::Drain::KeptSending) {
+        // A meter that is already printing never lets the line go quiet, and its lines are what
+        // listening is for: the drain's abort is no link failure.
+        s_.abortRequested = false;
+        s_.flushing = false;
+    } else if (s_.abortRequested) {
         fail();
         return;
     }

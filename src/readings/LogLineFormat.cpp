@@ -8,6 +8,19 @@ bool isDigit(QChar c) {
     return c >= QLatin1Char('0') && c <= QLatin1Char('9');
 }
 
+// The number a two-character year field holds: leading blanks skipped, then its digits (" 4"
+// and "4 " are 4). A field with no number in it gives nullopt.
+std::optional<int> yearNumber(QStringView field) {
+    qsizetype i = 0;
+    while (i < field.size() && field[i] == QLatin1Char(' '))
+        ++i;
+    int value = 0;
+    int digits = 0;
+    for (; i < field.size() && isDigit(field[i]); ++i, ++digits)
+        value = value * 10 + (field[i].unicode() - u'0');
+    return digits > 0 ? std::optional<int>(value) : std::nullopt;
+}
+
 } // namespace
 
 std::optional<QString> LogLineFormat::reformat(const QString& record, const LineLayout& layout) {
@@ -39,11 +52,10 @@ std::optional<QString> LogLineFormat::reformat(const QString& record, const Line
         return std::nullopt;
 
     if (shortYear) {
-        const QString yy = tail.mid(1, 2);
-        if (yy.size() != 2 || !isDigit(yy[0]) || !isDigit(yy[1]))
+        const std::optional<int> y = yearNumber(QStringView(tail).mid(1, 2));
+        if (!y)
             return std::nullopt;
-        const int y = yy.toInt();
-        const int year = y < 76 ? y + 2000 : y + 1900;
+        const int year = *y < 76 ? *y + 2000 : *y + 1900;
         const QString g = field.right(17);
         field = g.left(6) + QString::number(year) + QLatin1String("  ") + g.right(8);
     }

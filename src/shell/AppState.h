@@ -66,4 +66,6 @@ struct AppState {
     qint16 convertMsToUs = 0;
     qint16 convertPpkToPpm = 0;
     QString catalogDrive;
+    // The settings file could not be parsed when it was loaded; the next save moves it aside.
+    bool settingsFileBroken = false;
 };

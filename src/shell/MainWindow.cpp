@@ -18,6 +18,7 @@
 #include <QLabel>
 #include <QMenu>
 #include <QPlainTextEdit>
+#include <QPrinter>
 #include <QProgressBar>
 #include <QPushButton>
 #include <QScreen>
@@ -87,6 +88,12 @@ QString MainWindow::dataFolder() const {
 void MainWindow::setMessage(const QString& text) {
     c_.lblMessage->setText(text);
     c_.lblMessage->repaint();
+}
+
+QPrinter& MainWindow::printer() {
+    if (!printer_)
+        printer_ = std::make_unique<QPrinter>();
+    return *printer_;
 }
 
 void MainWindow::setLeftTwips(QWidget* w, int twips) {

@@ -70,6 +70,9 @@ public:
 
     // The data folder: the user's documents folder + "Telvio".
     QString dataFolder() const;
+    // The one printer of the program: what Print Setup chooses is used by every later print,
+    // the help windows' included. Made when first needed.
+    QPrinter& printer();
 
     // Called when ExitProgram ends the program; tests replace it to observe the exit.
     std::function<void()> endProgram;
@@ -97,6 +100,7 @@ private:
     std::unique_ptr<ReadingCommands> readings_;
     std::unique_ptr<WorkspaceCommands> workspace_;
     std::unique_ptr<HelpCommands> help_;
+    std::unique_ptr<QPrinter> printer_;
     QString dataFolder_;
     bool exiting_ = false;
 };

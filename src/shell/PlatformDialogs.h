@@ -25,6 +25,23 @@ public:
                                                   const QStringList& filters) = 0;
     virtual std::optional<QString> askOpenFile(QWidget* parent, const QString& folder,
                                                const QStringList& filters) = 0;
+
+    // What a file dialog starts from. The program keeps name and filter index from one use to
+    // the next, as one dialog component would.
+    struct FileRequest {
+        QString folder;
+        QString fileName; // proposed name, or the full path last used
+        QStringList filters;
+        int filterIndex = 0; // the filter selected when the dialog opens
+    };
+    // The file dialogs with everything they start from. An implementation that overrides only
+    // the forms above starts on the first filter, and its open dialog without a name.
+    virtual std::optional<SaveChoice> chooseSaveFile(QWidget* parent, const FileRequest& request) {
+        return askSaveFile(parent, request.folder, request.fileName, request.filters);
+    }
+    virtual std::optional<QString> chooseOpenFile(QWidget* parent, const FileRequest& request) {
+        return askOpenFile(parent, request.folder, request.filters);
+    }
     // The print dialog without page range, selection-only or print-to-file choices.
     // Returns false when cancelled.
     virtual bool askPrinter(QWidget* parent, QPrinter& printer) = 0;

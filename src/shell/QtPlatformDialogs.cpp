@@ -9,31 +9,45 @@
 std::optional<PlatformDialogs::SaveChoice>
 QtPlatformDialogs::askSaveFile(QWidget* parent, const QString& folder, const QString& proposedName,
                                const QStringList& filters) {
+    return chooseSaveFile(parent, {folder, proposedName, filters, 0});
+}
+
+std::optional<QString> QtPlatformDialogs::askOpenFile(QWidget* parent, const QString& folder,
+                                                      const QStringList& filters) {
+    return chooseOpenFile(parent, {folder, QString(), filters, 0});
+}
+
+std::optional<PlatformDialogs::SaveChoice>
+QtPlatformDialogs::chooseSaveFile(QWidget* parent, const FileRequest& request) {
     QFileDialog dialog(parent);
     dialog.setAcceptMode(QFileDialog::AcceptSave);
     dialog.setFileMode(QFileDialog::AnyFile);
     // The file-exists question is the program's own dialog.
     dialog.setOption(QFileDialog::DontConfirmOverwrite);
     dialog.setOption(QFileDialog::DontResolveSymlinks);
-    dialog.setDirectory(folder);
-    dialog.setNameFilters(filters);
-    dialog.selectFile(proposedName);
+    dialog.setDirectory(request.folder);
+    dialog.setNameFilters(request.filters);
+    dialog.selectNameFilter(request.filters.value(request.filterIndex));
+    dialog.selectFile(request.fileName);
     if (dialog.exec() != QDialog::Accepted || dialog.selectedFiles().isEmpty())
         return std::nullopt;
     SaveChoice choice;
     choice.path = dialog.selectedFiles().constFirst();
-    choice.filterIndex = qMax(0, int(filters.indexOf(dialog.selectedNameFilter())));
+    choice.filterIndex = qMax(0, int(request.filters.indexOf(dialog.selectedNameFilter())));
     return choice;
 }
 
-std::optional<QString> QtPlatformDialogs::askOpenFile(QWidget* parent, const QString& folder,
-                                                      const QStringList& filters) {
+std::optional<QString> QtPlatformDialogs::chooseOpenFile(QWidget* parent,
+                                                         const FileRequest& request) {
     QFileDialog dialog(parent);
     dialog.setAcceptMode(QFileDialog::AcceptOpen);
     dialog.setFileMode(QFileDialog::AnyFile); // a missing name gets the program's own message
     dialog.setOptions(QFileDialog::ReadOnly | QFileDialog::DontResolveSymlinks);
-    dialog.setDirectory(folder);
-    dialog.setNameFilters(filters);
+    dialog.setDirectory(request.folder);
+    dialog.setNameFilters(request.filters);
+    dialog.selectNameFilter(request.filters.value(request.filterIndex));
+    if (!request.fileName.isEmpty())
+        dialog.selectFile(request.fileName);
     if (dialog.exec() != QDialog::Accepted || dialog.selectedFiles().isEmpty())
         return std::nullopt;
     return dialog.selectedFiles().constFirst();

@@ -11,6 +11,8 @@ public:
                                           const QStringList& filters) override;
     std::optional<QString> askOpenFile(QWidget* parent, const QString& folder,
                                        const QStringList& filters) override;
+    std::optional<SaveChoice> chooseSaveFile(QWidget* parent, const FileRequest& request) override;
+    std::optional<QString> chooseOpenFile(QWidget* parent, const FileRequest& request) override;
     bool askPrinter(QWidget* parent, QPrinter& printer) override;
     bool openWithDefaultApplication(const QUrl& url) override;
 };

@@ -4,7 +4,9 @@
 #include "shell/Prompts.h"
 
 #include <QCoreApplication>
+#include <QDateTime>
 #include <QDir>
+#include <QFile>
 #include <QFileInfo>
 #include <QLocale>
 #include <QSettings>
@@ -54,6 +56,33 @@ QString numberText(double v) {
     return QString::number(v, 'g', QLocale::FloatingPointShortest);
 }
 
+// Renames a settings file that cannot be parsed to "<name>.broken-<date>-<time>" in its own
+// folder. Returns the new path, or "" when it could not be moved.
+QString moveAside(const QString& path) {
+    const QString stamp = QDateTime::currentDateTime().toString(QStringLiteral("yyyyMMdd-hhmmss"));
+    QString target = path + QStringLiteral(".broken-") + stamp;
+    for (int n = 2; QFileInfo::exists(target); ++n)
+        target = path + QStringLiteral(".broken-") + stamp + QLatin1Char('-') + QString::number(n);
+    return QFile::rename(path, target) ? target : QString();
+}
+
+// Writes the seven settings in their fixed order; returns the store's status afterwards.
+QSettings::Status writeAll(const AppState& state, QString* fileName) {
+    QSettings store(kOrganization, kApplication);
+    *fileName = store.fileName();
+    store.beginGroup(kSection);
+    store.setValue("COM", state.portName);
+    store.setValue("Baud", QString::number(state.baudRate));
+    store.setValue("LogInvterval", numberText(state.logInterval));
+    store.setValue("Asterisk", QString::number(state.convertAsterisks));
+    store.setValue("mS", QString::number(state.convertMsToUs));
+    store.setValue("ppK", QString::number(state.convertPpkToPpm));
+    store.setValue("Drive", state.catalogDrive);
+    store.endGroup();
+    store.sync();
+    return store.status();
+}
+
 QString executableBaseName() {
     const QString base = QFileInfo(QCoreApplication::applicationFilePath()).completeBaseName();
     return base.isEmpty() ? QString::fromLatin1(kApplication) : base;
@@ -81,6 +110,12 @@ bool LoadSettings(AppState& state, Prompts& prompts, bool* firstRun) {
         state.convertMsToUs = toWhole<qint16>(readText(store, "mS", "0"));
         state.convertPpkToPpm = toWhole<qint16>(readText(store, "ppK", "0"));
         state.catalogDrive = readText(store, "Drive", "d:");
+        // A file that cannot be parsed still gives what could be read, and the defaults for the
+        // rest; the next save moves it aside and writes a fresh one.
+        if (store.status() == QSettings::FormatError) {
+            state.settingsFileBroken = true;
+            throw ConversionError("settings file cannot be parsed");
+        }
         const bool first = IsFirstRun();
         if (firstRun)
             *firstRun = first;
@@ -92,23 +127,33 @@ bool LoadSettings(AppState& state, Prompts& prompts, bool* firstRun) {
     return true;
 }
 
-bool SaveSettings(const AppState& state, Prompts& prompts) {
-    QSettings store(kOrganization, kApplication);
-    store.beginGroup(kSection);
-    store.setValue("COM", state.portName);
-    store.setValue("Baud", QString::number(state.baudRate));
-    store.setValue("LogInvterval", numberText(state.logInterval));
-    store.setValue("Asterisk", QString::number(state.convertAsterisks));
-    store.setValue("mS", QString::number(state.convertMsToUs));
-    store.setValue("ppK", QString::number(state.convertPpkToPpm));
-    store.setValue("Drive", state.catalogDrive);
-    store.endGroup();
-    store.sync();
-    if (store.status() != QSettings::NoError) {
+bool SaveSettings(AppState& state, Prompts& prompts) {
+    // A file that cannot be parsed is kept under another name in the same folder, and a fresh
+    // one is written in its place. Qt reports the fault only to the first reader of the file, so
+    // the load's finding counts as well as the status of this write.
+    QString brokenFile;
+    if (state.settingsFileBroken) {
+        state.settingsFileBroken = false;
+        brokenFile = moveAside(QSettings(kOrganization, kApplication).fileName());
+    }
+    QString fileName;
+    QSettings::Status status = writeAll(state, &fileName);
+    if (status == QSettings::FormatError && brokenFile.isEmpty()) {
+        brokenFile = moveAside(fileName);
+        if (!brokenFile.isEmpty())
+            status = writeAll(state, &fileName);
+    }
+    if (status != QSettings::NoError) {
         prompts.show(QString::fromLatin1(kSaveError), Prompts::Icon::Information,
                      Prompts::Buttons::Ok);
         return false;
     }
+    if (!brokenFile.isEmpty())
+        prompts.show(
+            QStringLiteral("The settings file could not be read. It has been kept as\r\n") +
+                QDir::toNativeSeparators(brokenFile) +
+                QStringLiteral("\r\nand the settings have been saved in a new file."),
+            Prompts::Icon::Information, Prompts::Buttons::Ok);
     return true;
 }
 

@@ -1,5 +1,6 @@
 #include "workspace/ReadingConversions.h"
 
+#include <algorithm>
 #include <charconv>
 
 namespace {
@@ -46,6 +47,10 @@ QString positional(const char* first, const char* last) {
         }
     }
     return QString::fromLatin1(out, n);
+}
+
+bool isLineBreak(QChar c) {
+    return c == u'\n' || c == u'\r';
 }
 
 bool isDigit(QChar c) {
@@ -123,16 +128,23 @@ void ReadingConversions::convertUnit(QString& s, const QString& unit, const QStr
     // takes the four or five characters before it as its value field.
     for (qsizetype i = s.indexOf(unit, 4); i >= 0; i = s.indexOf(unit, i + unit.size())) {
         s.replace(i, unit.size(), replacement);
-        const qsizetype fieldStart = qMax<qsizetype>(0, i - kFieldWidth);
+        qsizetype fieldStart = qMax<qsizetype>(0, i - kFieldWidth);
+        // The value field ends at a line break: it is what follows the last CR or LF.
+        for (qsizetype k = i - 1; k >= fieldStart; --k) {
+            if (isLineBreak(s[k])) {
+                fieldStart = k + 1;
+                break;
+            }
+        }
         const auto t = convertValueField(QStringView(s).mid(fieldStart, i - fieldStart));
         if (!t)
             continue;
         // A rendering longer than the field overwrites what stands before it, but never
-        // reaches past the start of the text or into the previous line.
+        // reaches past the start of the text or over a line break.
         const qsizetype writeStart = i - t->size();
         if (writeStart < 0 ||
             (writeStart < fieldStart &&
-             QStringView(s).mid(writeStart, fieldStart - writeStart).contains(u'\n')))
+             std::any_of(s.cbegin() + writeStart, s.cbegin() + fieldStart, isLineBreak)))
             continue;
         for (qsizetype k = fieldStart; k < i; ++k)
             s[k] = QLatin1Char(' ');

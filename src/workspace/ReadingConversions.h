@@ -8,9 +8,10 @@
 // that was already converted changes nothing more (converted units carry their new name).
 //
 // A unit is looked for from the fifth character on; its value field is the six characters
-// before it, or the four or five there are when it stands fifth or sixth. A rendering longer
-// than the field overwrites what stands before it on the same line; when it would reach past
-// the start of the text or into the previous line, the field is left as it was (the unit is
+// before it, or the four or five there are when it stands fifth or sixth, and ends at a line
+// break: only the characters after the last CR or LF among them belong to it. A rendering
+// longer than the field overwrites what stands before it on the same line; when it would reach
+// past the start of the text or over a line break, the field is left as it was (the unit is
 // still renamed), so no line is ever damaged.
 struct ReadingConversions {
     bool msToUs = false;    // "mS" -> "uS", value times 1000

@@ -3,10 +3,30 @@
 #include "shell/MainWindow.h"
 #include "shell/Twips.h"
 
+#include <QFontMetrics>
 #include <QFrame>
 #include <QLabel>
 #include <QPlainTextEdit>
 #include <QProgressBar>
+
+namespace {
+constexpr int kHeaderToWorkspace = 210; // twips from the header's top to the workspace's top
+} // namespace
+
+int WindowLayout::fitHeader(const MainControls& c) {
+    QLabel* header = c.lblHeader;
+    const QFontMetrics metrics(header->font());
+    const int lineHeight = qMax(metrics.height(), metrics.lineSpacing());
+    header->setAlignment(Qt::AlignLeft | Qt::AlignTop);
+    header->resize(header->width(), lineHeight);
+    return qMax(0, lineHeight - twipsToPixels(kHeaderToWorkspace));
+}
+
+void WindowLayout::placeBelowHeader(const MainControls& c) {
+    const int room = fitHeader(c);
+    const QRect r = c.RichTextBox1->geometry();
+    c.RichTextBox1->setGeometry(r.x(), r.y() + room, r.width(), qMax(0, r.height() - room));
+}
 
 void WindowLayout::apply() {
     if (w_.isMinimized())
@@ -31,8 +51,9 @@ void WindowLayout::apply() {
     int workspaceHeight = height - (secondRow ? 3530 : 2510);
     if (s.percentFormat)
         workspaceHeight -= 340;
+    const int headerRoom = s.percentFormat ? fitHeader(c) : 0;
     c.RichTextBox1->resize(qMax(0, twipsToPixels(width - 60)),
-                           qMax(0, twipsToPixels(workspaceHeight)));
+                           qMax(0, twipsToPixels(workspaceHeight) - headerRoom));
 
     const std::initializer_list<QWidget*> statusLabels{
         c.lblModel,  c.lblVersion, c.lblModelData,  c.lblVersionData,

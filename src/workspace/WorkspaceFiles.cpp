@@ -47,14 +47,19 @@ void WorkspaceFiles::rememberFolder(const QString& path) {
 
 WorkspaceFiles::Chosen WorkspaceFiles::AskSaveFileName() {
     const QStringList filters = SaveNames::saveFilters(displayKind());
-    const auto answer = w_.dialogs().askSaveFile(&w_, folder(), DefaultSaveName(), filters);
+    // A filter index beyond the filters offered now (plain text only) starts on the first.
+    const int index = filterIndex_ < filters.size() ? filterIndex_ : 0;
+    const auto answer =
+        w_.dialogs().chooseSaveFile(&w_, {folder(), DefaultSaveName(), filters, index});
     if (!answer) {
         w_.state().saveCancelled = true;
         return {};
     }
+    filterIndex_ = answer->filterIndex;
     const bool comma = answer->filterIndex == 1 && filters.size() > 1;
     Chosen chosen{SaveNames::withDefaultExtension(answer->path, comma ? 1 : 0), comma};
     rememberFolder(chosen.path);
+    fileName_ = chosen.path;
     return chosen;
 }
 
@@ -104,11 +109,14 @@ void WorkspaceFiles::OpenFileIntoWorkspace() {
     const MainControls& c = w_.controls();
     w_.StopVoltageDisplay();
     w_.PromptSaveAndClear(QString());
-    const auto path = w_.dialogs().askOpenFile(&w_, folder(), SaveNames::openFilters());
+    const auto path =
+        w_.dialogs().chooseOpenFile(&w_, {folder(), fileName_, SaveNames::openFilters()});
     if (!path)
         return;
     rememberFolder(*path);
+    fileName_ = *path;
     if (!fileExists(*path)) {
+        fileName_.clear();
         w_.prompts().show(QStringLiteral("        File not found!        "), Prompts::Icon::None,
                           Prompts::Buttons::Ok);
     } else {

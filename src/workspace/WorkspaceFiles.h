@@ -29,4 +29,8 @@ private:
 
     MainWindow& w_;
     QString lastFolder_;
+    // Kept between uses, as one dialog component keeps them: the name last used for saving or
+    // opening (the open dialog starts with it) and the filter last chosen for saving.
+    QString fileName_;
+    int filterIndex_ = 0;
 };

@@ -12,10 +12,7 @@
 #include <QTextDocument>
 #include <QTextDocumentFragment>
 
-WorkspacePrinting::WorkspacePrinting(MainWindow& window)
-    : w_(window), printer_(std::make_unique<QPrinter>()) {}
-
-WorkspacePrinting::~WorkspacePrinting() = default;
+WorkspacePrinting::WorkspacePrinting(MainWindow& window) : w_(window) {}
 
 int WorkspacePrinting::trailingCarriageReturns(const QString& text) {
     int count = 0;
@@ -37,7 +34,8 @@ void WorkspacePrinting::removeTrailingCarriageReturns() {
 
 void WorkspacePrinting::Print() {
     w_.StopVoltageDisplay();
-    if (!w_.dialogs().askPrinter(&w_, *printer_))
+    QPrinter& printer = w_.printer();
+    if (!w_.dialogs().askPrinter(&w_, printer))
         return;
     removeTrailingCarriageReturns();
 
@@ -49,10 +47,10 @@ void WorkspacePrinting::Print() {
     doc.setDefaultFont(font);
     doc.setPlainText(selection.hasSelection() ? selection.selection().toPlainText()
                                               : w_.controls().RichTextBox1->toPlainText());
-    doc.print(printer_.get());
-    if (printer_->printerState() == QPrinter::Error) {
-        const QString target = printer_->outputFileName().isEmpty() ? printer_->printerName()
-                                                                    : printer_->outputFileName();
+    doc.print(&printer);
+    if (printer.printerState() == QPrinter::Error) {
+        const QString target =
+            printer.outputFileName().isEmpty() ? printer.printerName() : printer.outputFileName();
         w_.prompts().show(QStringLiteral("The document could not be printed on %1.").arg(target),
                           Prompts::Icon::Information, Prompts::Buttons::Ok);
     }
@@ -60,5 +58,5 @@ void WorkspacePrinting::Print() {
 
 void WorkspacePrinting::PrintSetup() {
     w_.StopVoltageDisplay();
-    w_.dialogs().askPrinter(&w_, *printer_);
+    w_.dialogs().askPrinter(&w_, w_.printer());
 }

@@ -1,16 +1,14 @@
 #pragma once
 
 #include <QString>
-#include <memory>
 
 class MainWindow;
-class QPrinter;
 
-// Print and Print Setup. The printer chosen in either dialog is kept for later printing.
+// Print and Print Setup, on the main window's printer: the printer chosen in either dialog is
+// kept for later printing.
 class WorkspacePrinting {
 public:
     explicit WorkspacePrinting(MainWindow& window);
-    ~WorkspacePrinting();
 
     void Print();
     void PrintSetup();
@@ -23,5 +21,4 @@ private:
     void removeTrailingCarriageReturns();
 
     MainWindow& w_;
-    std::unique_ptr<QPrinter> printer_;
 };
