@@ -41,11 +41,10 @@ public:
 
 class NoPlatformDialogs : public PlatformDialogs {
 public:
-    std::optional<SaveChoice> askSaveFile(QWidget*, const QString&, const QString&,
-                                          const QStringList&) override {
+    std::optional<SaveChoice> askSaveFile(QWidget*, const FileRequest&) override {
         return std::nullopt;
     }
-    std::optional<QString> askOpenFile(QWidget*, const QString&, const QStringList&) override {
+    std::optional<QString> askOpenFile(QWidget*, const FileRequest&) override {
         return std::nullopt;
     }
     bool askPrinter(QWidget*, QPrinter&) override { return false; }

@@ -18,30 +18,20 @@ public:
         int filterIndex = 0; // 0 = the first filter offered
     };
 
-    virtual ~PlatformDialogs() = default;
-    // filters: e.g. {"Text File   (*.txt)", "Comma Delimited    (*.csv)"}. nullopt = cancelled.
-    virtual std::optional<SaveChoice> askSaveFile(QWidget* parent, const QString& folder,
-                                                  const QString& proposedName,
-                                                  const QStringList& filters) = 0;
-    virtual std::optional<QString> askOpenFile(QWidget* parent, const QString& folder,
-                                               const QStringList& filters) = 0;
-
     // What a file dialog starts from. The program keeps name and filter index from one use to
     // the next, as one dialog component would.
     struct FileRequest {
         QString folder;
         QString fileName; // proposed name, or the full path last used
+        // e.g. {"Text File   (*.txt)", "Comma Delimited    (*.csv)"}
         QStringList filters;
         int filterIndex = 0; // the filter selected when the dialog opens
     };
-    // The file dialogs with everything they start from. An implementation that overrides only
-    // the forms above starts on the first filter, and its open dialog without a name.
-    virtual std::optional<SaveChoice> chooseSaveFile(QWidget* parent, const FileRequest& request) {
-        return askSaveFile(parent, request.folder, request.fileName, request.filters);
-    }
-    virtual std::optional<QString> chooseOpenFile(QWidget* parent, const FileRequest& request) {
-        return askOpenFile(parent, request.folder, request.filters);
-    }
+
+    virtual ~PlatformDialogs() = default;
+    // nullopt = cancelled.
+    virtual std::optional<SaveChoice> askSaveFile(QWidget* parent, const FileRequest& request) = 0;
+    virtual std::optional<QString> askOpenFile(QWidget* parent, const FileRequest& request) = 0;
     // The print dialog without page range, selection-only or print-to-file choices.
     // Returns false when cancelled.
     virtual bool askPrinter(QWidget* parent, QPrinter& printer) = 0;

@@ -7,18 +7,7 @@
 #include <QPrinter>
 
 std::optional<PlatformDialogs::SaveChoice>
-QtPlatformDialogs::askSaveFile(QWidget* parent, const QString& folder, const QString& proposedName,
-                               const QStringList& filters) {
-    return chooseSaveFile(parent, {folder, proposedName, filters, 0});
-}
-
-std::optional<QString> QtPlatformDialogs::askOpenFile(QWidget* parent, const QString& folder,
-                                                      const QStringList& filters) {
-    return chooseOpenFile(parent, {folder, QString(), filters, 0});
-}
-
-std::optional<PlatformDialogs::SaveChoice>
-QtPlatformDialogs::chooseSaveFile(QWidget* parent, const FileRequest& request) {
+QtPlatformDialogs::askSaveFile(QWidget* parent, const FileRequest& request) {
     QFileDialog dialog(parent);
     dialog.setAcceptMode(QFileDialog::AcceptSave);
     dialog.setFileMode(QFileDialog::AnyFile);
@@ -37,8 +26,7 @@ QtPlatformDialogs::chooseSaveFile(QWidget* parent, const FileRequest& request) {
     return choice;
 }
 
-std::optional<QString> QtPlatformDialogs::chooseOpenFile(QWidget* parent,
-                                                         const FileRequest& request) {
+std::optional<QString> QtPlatformDialogs::askOpenFile(QWidget* parent, const FileRequest& request) {
     QFileDialog dialog(parent);
     dialog.setAcceptMode(QFileDialog::AcceptOpen);
     dialog.setFileMode(QFileDialog::AnyFile); // a missing name gets the program's own message

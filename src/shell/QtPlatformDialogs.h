@@ -6,13 +6,8 @@
 // (never a shell command line, so no text handed over can run a command).
 class QtPlatformDialogs : public PlatformDialogs {
 public:
-    std::optional<SaveChoice> askSaveFile(QWidget* parent, const QString& folder,
-                                          const QString& proposedName,
-                                          const QStringList& filters) override;
-    std::optional<QString> askOpenFile(QWidget* parent, const QString& folder,
-                                       const QStringList& filters) override;
-    std::optional<SaveChoice> chooseSaveFile(QWidget* parent, const FileRequest& request) override;
-    std::optional<QString> chooseOpenFile(QWidget* parent, const FileRequest& request) override;
+    std::optional<SaveChoice> askSaveFile(QWidget* parent, const FileRequest& request) override;
+    std::optional<QString> askOpenFile(QWidget* parent, const FileRequest& request) override;
     bool askPrinter(QWidget* parent, QPrinter& printer) override;
     bool openWithDefaultApplication(const QUrl& url) override;
 };

@@ -50,7 +50,7 @@ WorkspaceFiles::Chosen WorkspaceFiles::AskSaveFileName() {
     // A filter index beyond the filters offered now (plain text only) starts on the first.
     const int index = filterIndex_ < filters.size() ? filterIndex_ : 0;
     const auto answer =
-        w_.dialogs().chooseSaveFile(&w_, {folder(), DefaultSaveName(), filters, index});
+        w_.dialogs().askSaveFile(&w_, {folder(), DefaultSaveName(), filters, index});
     if (!answer) {
         w_.state().saveCancelled = true;
         return {};
@@ -110,7 +110,7 @@ void WorkspaceFiles::OpenFileIntoWorkspace() {
     w_.StopVoltageDisplay();
     w_.PromptSaveAndClear(QString());
     const auto path =
-        w_.dialogs().chooseOpenFile(&w_, {folder(), fileName_, SaveNames::openFilters()});
+        w_.dialogs().askOpenFile(&w_, {folder(), fileName_, SaveNames::openFilters()});
     if (!path)
         return;
     rememberFolder(*path);

@@ -16,18 +16,9 @@
 #include <QTest>
 
 namespace {
-// Records what the file dialogs start from; a print dialog that finds a printer chosen keeps it.
+// A print dialog that finds a printer chosen keeps it.
 class KeepingDialogs : public ScriptedDialogs {
 public:
-    QList<FileRequest> requests;
-    std::optional<SaveChoice> chooseSaveFile(QWidget* p, const FileRequest& r) override {
-        requests << r;
-        return askSaveFile(p, r.folder, r.fileName, r.filters);
-    }
-    std::optional<QString> chooseOpenFile(QWidget* p, const FileRequest& r) override {
-        requests << r;
-        return askOpenFile(p, r.folder, r.filters);
-    }
     bool askPrinter(QWidget* p, QPrinter& printer) override {
         return !printer.outputFileName().isEmpty() || ScriptedDialogs::askPrinter(p, printer);
     }
@@ -68,10 +59,11 @@ private slots:
         ws.SaveWorkspace();
         ws.SaveWorkspace();
         ws.OpenFileIntoWorkspace();
-        QCOMPARE(d.requests.size(), 3);
-        QCOMPARE(d.requests[1].filterIndex, 1);
-        QCOMPARE(d.requests[1].fileName, QStringLiteral("Log data"));
-        QCOMPARE(d.requests[2].fileName, csv);
+        QCOMPARE(d.saveCalls.size(), 2);
+        QCOMPARE(d.saveCalls[1].filterIndex, 1);
+        QCOMPARE(d.saveCalls[1].proposedName, QStringLiteral("Log data"));
+        QCOMPARE(d.openCalls.size(), 1);
+        QCOMPARE(d.openCalls[0].fileName, csv);
     }
 
     void helpPrintsOnTheSetUpPrinter() {

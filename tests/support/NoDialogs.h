@@ -7,11 +7,10 @@
 // Platform dialogs that are always cancelled; URLs handed over are only recorded.
 class NoDialogs : public PlatformDialogs {
 public:
-    std::optional<SaveChoice> askSaveFile(QWidget*, const QString&, const QString&,
-                                          const QStringList&) override {
+    std::optional<SaveChoice> askSaveFile(QWidget*, const FileRequest&) override {
         return std::nullopt;
     }
-    std::optional<QString> askOpenFile(QWidget*, const QString&, const QStringList&) override {
+    std::optional<QString> askOpenFile(QWidget*, const FileRequest&) override {
         return std::nullopt;
     }
     bool askPrinter(QWidget*, QPrinter&) override { return false; }

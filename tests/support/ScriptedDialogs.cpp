@@ -26,10 +26,9 @@ void ScriptedDialogs::cancelPrint() {
     prints_.enqueue(std::nullopt);
 }
 
-std::optional<PlatformDialogs::SaveChoice>
-ScriptedDialogs::askSaveFile(QWidget*, const QString& folder, const QString& proposedName,
-                             const QStringList& filters) {
-    saveCalls.append({folder, proposedName, filters});
+std::optional<PlatformDialogs::SaveChoice> ScriptedDialogs::askSaveFile(QWidget*,
+                                                                        const FileRequest& r) {
+    saveCalls.append({r.folder, r.fileName, r.filters, r.filterIndex});
     if (saves_.isEmpty()) {
         ++unanswered;
         return std::nullopt;
@@ -37,9 +36,8 @@ ScriptedDialogs::askSaveFile(QWidget*, const QString& folder, const QString& pro
     return saves_.dequeue();
 }
 
-std::optional<QString> ScriptedDialogs::askOpenFile(QWidget*, const QString& folder,
-                                                    const QStringList& filters) {
-    openCalls.append({folder, filters});
+std::optional<QString> ScriptedDialogs::askOpenFile(QWidget*, const FileRequest& r) {
+    openCalls.append({r.folder, r.fileName, r.filters});
     if (opens_.isEmpty()) {
         ++unanswered;
         return std::nullopt;

@@ -13,9 +13,11 @@ public:
         QString folder;
         QString proposedName;
         QStringList filters;
+        int filterIndex;
     };
     struct OpenCall {
         QString folder;
+        QString fileName;
         QStringList filters;
     };
 
@@ -36,11 +38,8 @@ public:
     QList<QUrl> openedWithDefault;
     int unanswered = 0;
 
-    std::optional<SaveChoice> askSaveFile(QWidget* parent, const QString& folder,
-                                          const QString& proposedName,
-                                          const QStringList& filters) override;
-    std::optional<QString> askOpenFile(QWidget* parent, const QString& folder,
-                                       const QStringList& filters) override;
+    std::optional<SaveChoice> askSaveFile(QWidget* parent, const FileRequest& request) override;
+    std::optional<QString> askOpenFile(QWidget* parent, const FileRequest& request) override;
     bool askPrinter(QWidget* parent, QPrinter& printer) override;
     bool openWithDefaultApplication(const QUrl& url) override;
 
