@@ -10,7 +10,8 @@
 #include <QAction>
 #include <QPushButton>
 
-HelpCommands::HelpCommands(MainWindow& window) : QObject(&window), w_(window) {
+HelpCommands::HelpCommands(MainWindow& window)
+    : QObject(&window), w_(window), folder_(programFolder()) {
     const MainControls& c = w_.controls();
     connect(c.mnuHelpGeneral, &QAction::triggered, this, &HelpCommands::mnuHelpGeneral_Click);
     connect(c.cmdHelp, &QPushButton::clicked, this, &HelpCommands::mnuHelpGeneral_Click);
@@ -22,22 +23,21 @@ HelpCommands::HelpCommands(MainWindow& window) : QObject(&window), w_(window) {
 
 void HelpCommands::mnuHelpGeneral_Click() {
     w_.StopVoltageDisplay();
-    HelpWindow help(HelpKind::General, w_.state(), w_.prompts(), w_.dialogs(), programFolder(),
-                    &w_);
+    HelpWindow help(HelpKind::General, w_.state(), w_.prompts(), w_.dialogs(), folder_, &w_);
     help.usePrinter(&w_.printer());
     help.exec();
 }
 
 void HelpCommands::mnuK5help_Click() {
     w_.StopVoltageDisplay();
-    HelpWindow help(HelpKind::Other, w_.state(), w_.prompts(), w_.dialogs(), programFolder(), &w_);
+    HelpWindow help(HelpKind::Other, w_.state(), w_.prompts(), w_.dialogs(), folder_, &w_);
     help.usePrinter(&w_.printer());
     help.exec();
 }
 
 void HelpCommands::mnuAboutKVO_Click() {
     w_.StopVoltageDisplay();
-    AboutKvoDialog about(w_.state(), w_.prompts(), w_.dialogs(), programFolder(), &w_);
+    AboutKvoDialog about(w_.state(), w_.prompts(), w_.dialogs(), folder_, &w_);
     about.exec();
 }
 

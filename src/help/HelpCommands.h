@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QObject>
+#include <QString>
 
 class MainWindow;
 
@@ -11,6 +12,11 @@ class HelpCommands : public QObject {
 public:
     explicit HelpCommands(MainWindow& window);
 
+    // The folder the help files and the splash picture are read from; the program's own folder
+    // unless set otherwise.
+    const QString& folder() const { return folder_; }
+    void setFolder(const QString& folder) { folder_ = folder; }
+
     void mnuHelpGeneral_Click();
     void mnuK5help_Click();
     void mnuAboutKVO_Click();
@@ -19,4 +25,5 @@ public:
 
 private:
     MainWindow& w_;
+    QString folder_;
 };
