@@ -208,6 +208,16 @@ private slots:
         }
         QVERIFY(f.state().helpTopics.value(0).startsWith("Enable"));
         QVERIFY(f.prompts.shown.isEmpty() && dialogs.openedWithDefault.isEmpty());
+        // Help prints on the printer chosen in Print Setup.
+        dialogs.printToPdf(tmp.filePath("setup.pdf"));
+        dialogs.acceptPrinter();
+        c.mnuPrintSetUp->trigger();
+        withModal([&] { c.mnuHelpGeneral->trigger(); },
+                  [](QWidget* m) {
+                      static_cast<HelpWindow*>(m)->PrintHelpFile();
+                      m->close();
+                  });
+        QVERIFY(QFileInfo(tmp.filePath("setup.pdf")).size() > 0);
     }
 };
 

@@ -16,6 +16,10 @@
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QTest>
+#include <atomic>
+#include <thread>
+
+using namespace std::chrono_literals;
 
 namespace {
 
@@ -284,6 +288,30 @@ private slots:
         f.meter->vanish();
         usable(f, dismiss);
         QCOMPARE(text, kept);
+    }
+
+    // A meter that prints every 50 ms never lets the line go quiet: it is listened to all the
+    // same, and every line after the drain arrives, in order.
+    void listenToPrintingMeter() {
+        WindowFixture f;
+        QVERIFY(up(f, "plain"));
+        std::atomic<int> sent{0};
+        std::jthread meter([&](std::stop_token stop) {
+            for (; !stop.stop_requested(); std::this_thread::sleep_for(50ms))
+                f.meter->sendUnsolicited(QByteArray::number(++sent) + " 7.00pH\r");
+        });
+        ModalDismisser dismiss;
+        f.c().cmdListen->click();
+        const QString& text = f.state().workspaceText;
+        QVERIFY(f.waitUntil([&] { return text.count('\r') >= 5; }));
+        meter.request_stop();
+        meter.join();
+        QVERIFY(f.waitUntil([&] { return text.endsWith(QString("%1 7.00pH\r").arg(sent)); }));
+        f.c().cmdStopCurrentData->click();
+        QVERIFY(f.meter->waitForReceived("Z", 1, 1000) && idle(f) && dismiss.seen.isEmpty());
+        const QStringList got = text.split('\r', Qt::SkipEmptyParts);
+        for (int i = 1; i < got.size(); ++i)
+            QCOMPARE(got[i].section(' ', 0, 0).toInt(), got[i - 1].section(' ', 0, 0).toInt() + 1);
     }
 
     // The port vanishes in a download: the records that came are kept.

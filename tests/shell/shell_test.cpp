@@ -91,6 +91,17 @@ private slots:
         // A value of another type, as another program may leave it.
         QSettings("Telvio", "Telvio").setValue("Settings/mS", QVariantMap());
         QVERIFY(!Settings::LoadSettings(s, p) && p.shown.size() == 2);
+        // A file the store cannot parse is reported, then moved aside (never lost) at the next
+        // save, which writes a fresh one.
+        TestSettings fresh;
+        fresh.set("COM", "COM7");
+        QFile broken(QSettings("Telvio", "Telvio").fileName());
+        QVERIFY(broken.open(QIODevice::WriteOnly) && broken.write("[Settings\nCOM=COM7\n") > 0);
+        broken.close();
+        QVERIFY(!Settings::LoadSettings(s, p) && Settings::SaveSettings(s, p));
+        const QFileInfo aside = QFileInfo(broken).dir().entryInfoList({"*.broken*"}).value(0);
+        QVERIFY(p.shown.last().text.contains(aside.filePath()) && aside.size() == 19);
+        QCOMPARE(fresh.value("Baud"), "9600");
     }
 
     // Start-up goes on after a bad setting (no wizard on this first run) to the connection

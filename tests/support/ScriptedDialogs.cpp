@@ -54,6 +54,8 @@ bool ScriptedDialogs::askPrinter(QWidget*, QPrinter& printer) {
     const std::optional<QString> pdf = prints_.dequeue();
     if (!pdf)
         return false;
+    if (pdf->isEmpty())
+        return true;
     printer.setOutputFormat(QPrinter::PdfFormat);
     printer.setOutputFileName(*pdf);
     return true;

@@ -29,6 +29,8 @@ public:
     // The next print dialog chooses PDF output to this file.
     void printToPdf(const QString& pdfPath);
     void cancelPrint();
+    // The next print dialog is accepted as it opens, on the printer it was given.
+    void acceptPrinter() { prints_.enqueue(QString()); }
     void setOpenWithResult(bool ok) { openWithResult_ = ok; }
 
     // What was asked.

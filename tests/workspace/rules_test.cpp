@@ -40,7 +40,10 @@ private slots:
             // A rendering that would reach before the text or into the line above is not written.
             {1, "abc\n-99999mS\n", "abc\n-99999uS\n"}, {1, "12.5mS\n", "12.5uS\n"},
             {1, "1mS 1.41mS", "1mS 1.41uS"}, {2, "ab 1.413mS 0*525ppK\n", "ab 1.413mS   525ppM\n"},
-            {5, "ab1*2345mS 7*00\n", "ab1234.5uS 7.00\n"}, {0, "1.41mS 0*5ppK", "1.41mS 0*5ppK"}};
+            {5, "ab1*2345mS 7*00\n", "ab1234.5uS 7.00\n"}, {0, "1.41mS 0*5ppK", "1.41mS 0*5ppK"},
+            // The value field ends at a line break, which is never overwritten.
+            {1, "x\n1.413mS", "x\n 1413uS"}, {1, "x\r1.413mS", "x\r 1413uS"},
+            {1, "abc\n1*5mS", "abc\n1*5uS"}, {1, "\n--.--mS", "\n--.--uS"}};
         // clang-format on
         for (auto [on, in, out] : rows) {
             QCOMPARE(with(on).apply(in), out);
