@@ -50,7 +50,6 @@ private slots:
             {"P100  1.0 S1 0004 +%g\r", "", "%|P100||1.0|~|la"},
             {"K5XP 1 S 5 M%\r", "", "%|K5XP|1|S|5|klgs"},
             {"K50 busy\r", "", "U|~|~|~|~|"},
-            {"EXIT\r", "", "U|~|~|~|~|"},
             {"ERROR\r", "", "E|~|~|~|~|"},
         };
         for (auto [reply, held, expected] : rows)

@@ -95,8 +95,13 @@ private slots:
                               "User has terminated this process."}));
         QVERIFY(!c.tmrDisplayVoltage->isActive());
 
+        // A reply other than "ERASED" leaves the confirmation open; Yes once more.
         f.prompts.clear();
-        clickWhenModal("frmLogEraseCheck", "cmdOK");
+        m.queueReplies("?E", {"NOT NOW\r"});
+        whenModal("frmLogEraseCheck", [&](QWidget* d) {
+            click(d, "cmdOK");
+            click(d, "cmdOK");
+        });
         c.mnuEraseLog->trigger();
         QCOMPARE(f.prompts.texts().join("") + c.lblNumLogData->text(), "Logged readings erased.0");
 
@@ -129,8 +134,7 @@ private slots:
         m.clearReceived();
         c.cmdK5Off->click();
         // The wake-up, two drains (the first reads the wake-up's reply), "?K".
-        const QByteArray wakeUp = QByteArray("{@").repeated(24) + "?S\r";
-        QCOMPARE(m.received(), wakeUp + "\n\n\n?K\r");
+        QCOMPARE(m.received(), QByteArray("{@").repeated(24) + "?S\r\n\n\n?K\r");
         QCOMPARE(c.lblMessage->text() + c.lblModelData->text() + c.lblNumLogData->text(),
                  "Meter  has  been  shut  down.");
         QVERIFY(!c.cmdK5Off->isEnabled() && !c.mnuDisplay->isEnabled() && !f.line.isOpen());

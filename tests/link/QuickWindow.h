@@ -16,14 +16,18 @@
 struct QuickWindow : WindowFixture {
     struct Line : QtSerialLine {
         TestClock& clock;
-        // How long the meter seems to take over each command.
-        double secondsPerWrite = 0;
+        // How long the meter seems to take over each command, and over each byte it sends.
+        double secondsPerWrite = 0, secondsPerRead = 0;
         // Real wait for a drain's or a detection poll's time-out (0.15 s or less).
         int patienceMs = 20;
         explicit Line(TestClock& c) : clock(c) {}
         qint32 write(const QByteArray& bytes) override {
             clock.advance(secondsPerWrite);
             return QtSerialLine::write(bytes);
+        }
+        int readByte() override {
+            clock.advance(secondsPerRead);
+            return QtSerialLine::readByte();
         }
         bool waitForByte(int ms) override {
             const int real = std::min(ms, ms > 150 ? 300 : patienceMs);
@@ -44,9 +48,7 @@ struct QuickWindow : WindowFixture {
     }
     void query() { window->instrument().QueryStatus(); }
     bool open(const QString& profile) {
-        if (!startMeter(profile))
-            return false;
-        begin();
-        return waitUntil([this] { return !state().modelCode.isEmpty(); });
+        return startMeter(profile) &&
+               (begin(), waitUntil([this] { return !state().modelCode.isEmpty(); }));
     }
 };
