@@ -58,6 +58,10 @@ private slots:
         StatusReply r;
         parseVersionReply("QR32 Ver2.1 A12345\r", r);
         QCOMPARE(*r.firmwareVersion + *r.serialNumber, "2.1A12345");
+        // A short reply delivers only the fields it holds.
+        StatusReply s;
+        parseVersionReply("QR32VER 1.5 A1234", s);
+        QVERIFY(s.firmwareVersion == "1.5" && !s.serialNumber);
         QVERIFY(parseCount(" 12 ") == 12 && !parseCount("+12") && !parseCount("2147483648"));
     }
 
@@ -70,9 +74,9 @@ private slots:
 
         // What the parser does not ask: q QR32 layout, x max/min, 2 two-second minimum, d short
         // date and time.
-        const char* codes[][2] = {{"QR32", "q"},   {"ZUM410", ""}, {"QR321", ""},  {"QR34ZZ", "x"},
-                                  {"qr34", ""},    {"K50V3", "2"}, {"K50V35", ""}, {"ab-lxt9", "2"},
-                                  {"marin2", "d"}, {"Marin", ""},  {"lago", "d"}};
+        const char* codes[][2] = {{"QR32", "q"}, {"ZUM410", ""},  {"QR321", ""},  {"QR34ZZ", "x"},
+                                  {"qr34", ""},  {"K50V3", "2"},  {"K50V35", ""}, {"ab-LXT9", "2"},
+                                  {"lxt", ""},   {"marin2", "d"}, {"Marin", ""},  {"lago", "d"}};
         for (auto [c, expected] : codes)
             QCOMPARE(letters("qx2d", {usesQr32Layout(c), keepsMaxMin(c),
                                       modelMinimumIntervalSeconds(c) == 2, usesShortDateTime(c)}),

@@ -56,14 +56,19 @@ private slots:
                                   f.meter->count("?W\r") == 1}),
                      QList<bool>({r.canAutoLog(), stir, r.isK5Family, r.hasGLP, log, maxMin,
                                   pct && r.reportsVoltage(), pct, r.needsVersionQuery}));
-            // Power button, help button and workspace, in twips.
+            // Power button, help button and workspace, in twips; the workspace moves down by
+            // what a header line needs beyond its room.
             const int first = r.canAutoLog() ? 2550 : 30, help = log ? 6750 : 5070;
-            QCOMPARE(
-                QList<int>({c.cmdK5On->x(), c.cmdHelp->x(), c.RichTextBox1->y()}),
-                QList<int>({r.isK5Family ? twipsToPixels(first + 2520 * stir) : c.cmdK5On->x(),
-                            twipsToPixels(maxMin || r.hasGLP ? 7590 : help),
-                            twipsToPixels(pct ? 1420 + 1020 * (r.isK5Family || first > 30 || stir)
-                                              : 1080 + 1020 * r.isK5Family)}));
+            const int line = QFontMetrics(c.lblHeader->font()).lineSpacing();
+            const int room = pct ? qMax(0, line - twipsToPixels(210)) : 0;
+            QVERIFY(!pct || (c.lblHeader->height() >= line &&
+                             c.lblHeader->geometry().bottom() < c.RichTextBox1->y()));
+            QCOMPARE(QList<int>({c.cmdK5On->x(), c.cmdHelp->x(), c.RichTextBox1->y()}),
+                     QList<int>({r.isK5Family ? twipsToPixels(first + 2520 * stir) : c.cmdK5On->x(),
+                                 twipsToPixels(maxMin || r.hasGLP ? 7590 : help),
+                                 room + twipsToPixels(
+                                            pct ? 1420 + 1020 * (r.isK5Family || first > 30 || stir)
+                                                : 1080 + 1020 * r.isK5Family)}));
         }
 
         // After "qr34"; the battery warning was the only message.

@@ -309,8 +309,12 @@ private slots:
         qApp->processEvents();
         const int W = pixelsToTwips(w->frameGeometry().width());
         const int H = pixelsToTwips(w->frameGeometry().height());
-        for (bool k5 : {false, true}) {
+        // Plain; percent (with the column header); percent with the header's font at 2x.
+        for (int k5 : {0, 1, 2}) {
             s().isK5Family = s().percentFormat = k5;
+            QFont font = c().lblHeader->font();
+            font.setPointSizeF(font.pointSizeF() * qMax(1, k5));
+            c().lblHeader->setFont(font);
             emit w->resized();
             // A header taller than its room pushes the workspace down by the difference.
             const int line = QFontMetrics(c().lblHeader->font()).lineSpacing();
