@@ -2,9 +2,7 @@
 
 #include "shell/PlatformDialogs.h"
 
-#include <QList>
-
-// Platform dialogs that are always cancelled; URLs handed over are only recorded.
+// Platform dialogs that are always cancelled; nothing is ever opened.
 class NoDialogs : public PlatformDialogs {
 public:
     std::optional<SaveChoice> askSaveFile(QWidget*, const FileRequest&) override {
@@ -14,9 +12,5 @@ public:
         return std::nullopt;
     }
     bool askPrinter(QWidget*, QPrinter&) override { return false; }
-    bool openWithDefaultApplication(const QUrl& url) override {
-        opened << url;
-        return true;
-    }
-    QList<QUrl> opened;
+    bool openWithDefaultApplication(const QUrl&) override { return false; }
 };

@@ -33,11 +33,6 @@ QString TestSettings::value(const QString& key) const {
     return s.value(QStringLiteral("Settings/") + key).toString();
 }
 
-bool TestSettings::contains(const QString& key) const {
-    QSettings s(QStringLiteral("Telvio"), QStringLiteral("Telvio"));
-    return s.contains(QStringLiteral("Settings/") + key);
-}
-
 void TestSettings::markFirstRunDone() {
     QSettings s(QStringLiteral("Telvio"), firstRunApplication());
     s.setValue(QStringLiteral("Settings/FirstRun"), QStringLiteral("False"));

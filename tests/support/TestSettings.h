@@ -13,7 +13,6 @@ public:
     // A value of the program's settings section.
     void set(const QString& key, const QString& value);
     QString value(const QString& key) const;
-    bool contains(const QString& key) const;
     // Marks the first start as done, so no setup wizard runs.
     void markFirstRunDone();
     void clearFirstRun();

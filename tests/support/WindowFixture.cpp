@@ -36,15 +36,6 @@ void WindowFixture::start() {
     window->start();
 }
 
-bool WindowFixture::startDetected(const QString& profile, int timeoutMs) {
-    if (!startMeter(profile))
-        return false;
-    start();
-    return waitUntil(
-        [this] { return !c().tmrDetectMeter->isActive() && !state().modelCode.isEmpty(); },
-        timeoutMs);
-}
-
 bool WindowFixture::waitUntil(const std::function<bool()>& condition, int timeoutMs) {
     return QTest::qWaitFor(condition, timeoutMs);
 }

@@ -26,8 +26,6 @@ public:
     MainWindow& createWindow();
     // Runs the window's start-up sequence.
     void start();
-    // Meter, window, start-up, and waits until the meter has been detected.
-    bool startDetected(const QString& profile, int timeoutMs = 8000);
     bool waitUntil(const std::function<bool()>& condition, int timeoutMs = 5000);
 
     AppState& state() { return window->state(); }
