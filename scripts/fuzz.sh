@@ -2,7 +2,8 @@
 # Builds the libFuzzer targets with clang (build-fuzz) and runs each for a set time.
 #   scripts/fuzz.sh [--ci] [--seconds N] [target ...]
 # Default: every target for 20 s; --ci: 5 s each (the seed corpus and a little beyond; long runs
-# are for by hand). Targets are the names under fuzz/ without ".cpp" (status_reply, log_line, ...). A crash, a hang (over 5 s for one input), a sanitizer
+# are for by hand). Targets are the names under fuzz/ without ".cpp" (status_reply, log_line,
+# ...). A crash, a hang (over 5 s for one input), a sanitizer
 # report or a broken invariant stops that target, keeps the input under build-fuzz/artifacts/
 # and makes the script fail. New inputs the fuzzer finds go to build-fuzz/corpus/, never into
 # the seed corpus in the repository.
