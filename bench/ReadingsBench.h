@@ -3,11 +3,11 @@
 // Shared set-up of the readings benchmarks (header only; each benchmark is its own program):
 // the real main window offscreen, settings in a temporary folder, a simulated meter in-process.
 
-#include "link/QtSerialLine.h"
-#include "shell/MainWindow.h"
-#include "shell/PlatformDialogs.h"
-#include "shell/Prompts.h"
-#include "shell/SystemClock.h"
+#include "core/Prompts.h"
+#include "core/link/QtSerialLine.h"
+#include "core/settings/SystemClock.h"
+#include "desktop/shell/MainWindow.h"
+#include "desktop/shell/PlatformDialogs.h"
 
 #include <Meter.h>
 

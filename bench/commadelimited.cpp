@@ -1,5 +1,5 @@
 // The comma-delimited conversion at 1 MiB and 2 MiB. Target: 1 MiB in under 50 ms.
-#include "workspace/CommaDelimited.h"
+#include "core/text/CommaDelimited.h"
 #include "BenchTimer.h"
 
 #include <QElapsedTimer>

@@ -1,7 +1,7 @@
 // Unit and asterisk conversions over a whole workspace, at two sizes to show linearity.
 // Target: a 10,000-line, 600 KB workspace in under 20 ms.
 #include "BenchTimer.h"
-#include "workspace/ReadingConversions.h"
+#include "core/readings/ReadingConversions.h"
 
 #include <QElapsedTimer>
 #include <algorithm>

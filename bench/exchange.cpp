@@ -1,10 +1,10 @@
 // 10,000 "?S" exchanges with the simulated meter through the real exchange, and the processor
 // time of a 2-second wait for a reply that never comes.
-#include "link/Exchange.h"
-#include "link/QtSerialLine.h"
-#include "shell/MainWindow.h"
-#include "shell/Prompts.h"
-#include "shell/SystemClock.h"
+#include "desktop/link/Exchange.h"
+#include "core/Prompts.h"
+#include "core/link/QtSerialLine.h"
+#include "core/settings/SystemClock.h"
+#include "desktop/shell/MainWindow.h"
 
 #include <Meter.h>
 #include <QApplication>

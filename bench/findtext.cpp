@@ -1,6 +1,6 @@
 // One Find press over 1 MiB and 2 MiB of workspace text: the match at the very end (the whole
 // text searched) and a text that is not there (searched and wrapped). Target: 1 MiB < 10 ms.
-#include "workspace/FindText.h"
+#include "core/text/FindText.h"
 #include "BenchTimer.h"
 
 #include <QElapsedTimer>

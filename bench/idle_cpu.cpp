@@ -1,11 +1,11 @@
 // CPU share of the program while it waits: the detect polling against a meter that never
 // answers, and a listen run with no data. The main window runs offscreen against the simulated
 // meter; only the user-interface thread is measured (the meter's own thread is not the program).
-#include "link/QtSerialLine.h"
-#include "shell/MainWindow.h"
-#include "shell/PlatformDialogs.h"
-#include "shell/Prompts.h"
-#include "shell/SystemClock.h"
+#include "core/Prompts.h"
+#include "core/link/QtSerialLine.h"
+#include "core/settings/SystemClock.h"
+#include "desktop/shell/MainWindow.h"
+#include "desktop/shell/PlatformDialogs.h"
 
 #include "ReadingsBench.h"
 

@@ -2,8 +2,8 @@
 // 115,200 baud taken whole.
 #include "ReadingsBench.h"
 
-#include "readings/ListenMode.h"
-#include "readings/ReadingCommands.h"
+#include "desktop/readings/ListenMode.h"
+#include "desktop/readings/ReadingCommands.h"
 
 #include <QApplication>
 #include <sys/prctl.h>

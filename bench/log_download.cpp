@@ -2,8 +2,8 @@
 // allows, then paced at 38,400 baud and compared with the time the bytes need on the wire.
 #include "ReadingsBench.h"
 
-#include "readings/LogDownload.h"
-#include "readings/ReadingCommands.h"
+#include "desktop/readings/LogDownload.h"
+#include "desktop/readings/ReadingCommands.h"
 
 #include <QApplication>
 #include <cmath>

@@ -2,8 +2,8 @@
 // in the fixed-pitch workspace control. Run once per size (peak memory is per process):
 //   bench_openfile 10     (MiB; target under 1 s and under 150 MB peak)
 #include "BenchTimer.h"
-#include "workspace/WorkspaceFileIO.h"
-#include "workspace/WorkspaceView.h"
+#include "core/text/WorkspaceFileIO.h"
+#include "desktop/workspace/WorkspaceView.h"
 
 #include <QApplication>
 #include <QElapsedTimer>

@@ -3,9 +3,9 @@
 // memory of a 10,000-line table.
 #include "ReadingsBench.h"
 
-#include "readings/LineLayout.h"
-#include "readings/RealTimeLine.h"
-#include "readings/WorkspaceLines.h"
+#include "core/readings/LineLayout.h"
+#include "core/readings/RealTimeLine.h"
+#include "desktop/readings/WorkspaceLines.h"
 
 #include <QAction>
 #include <QApplication>

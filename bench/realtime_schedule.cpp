@@ -4,8 +4,8 @@
 // Takes two minutes.
 #include "ReadingsBench.h"
 
-#include "readings/ReadingCommands.h"
-#include "readings/RealTimeRun.h"
+#include "desktop/readings/ReadingCommands.h"
+#include "desktop/readings/RealTimeRun.h"
 
 #include <QApplication>
 #include <algorithm>

@@ -1,6 +1,6 @@
 // Workspace text turned into comma-delimited lines for a .csv file.
 #include "FuzzInput.h"
-#include "workspace/CommaDelimited.h"
+#include "core/text/CommaDelimited.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     FuzzInput in(data, size);

@@ -1,6 +1,6 @@
 // The unit and asterisk conversions applied to the whole workspace after a download.
 #include "FuzzInput.h"
-#include "workspace/ReadingConversions.h"
+#include "core/readings/ReadingConversions.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     FuzzInput in(data, size);

@@ -1,8 +1,8 @@
 // A file opened for display, read item by item as a delimited-field input, and its bytes
 // decoded as UTF-8 or Latin-1.
 #include "FuzzInput.h"
-#include "workspace/DelimitedFieldReader.h"
-#include "workspace/TextFileCodec.h"
+#include "core/text/DelimitedFieldReader.h"
+#include "core/text/TextFileCodec.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     FuzzInput in(data, size);

@@ -1,6 +1,6 @@
 // The percent meters' column header ("?H") and column positions ("?P"): where Log# stands.
 #include "FuzzInput.h"
-#include "readings/HeaderPosition.h"
+#include "core/readings/HeaderPosition.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     FuzzInput in(data, size);

@@ -1,6 +1,6 @@
 // The two help files read beside the program: blocks ended by "#" lines, any line ends.
 #include "FuzzInput.h"
-#include "help/HelpFile.h"
+#include "core/text/HelpFile.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     FuzzInput in(data, size);

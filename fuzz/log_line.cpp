@@ -1,7 +1,7 @@
 // Log records as the meter sends them during a download: the general, two-digit-year, K5,
 // marin/lago and percent layouts, and the fixed QR32 record.
 #include "FuzzInput.h"
-#include "readings/LogLineFormat.h"
+#include "core/readings/LogLineFormat.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     FuzzInput in(data, size);

@@ -1,6 +1,6 @@
 // The meter's reply to "?D" turned into one real-time line, for every line layout.
 #include "FuzzInput.h"
-#include "readings/RealTimeLine.h"
+#include "core/readings/RealTimeLine.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     FuzzInput in(data, size);

@@ -1,9 +1,9 @@
 // The per-user settings as a user, another program or a damaged disk may leave them: garbage
 // in the settings file, or values of the wrong type, very long or not numbers at all.
-#include "shell/Settings.h"
+#include "core/settings/Settings.h"
 #include "FuzzInput.h"
-#include "shell/AppState.h"
-#include "shell/Prompts.h"
+#include "core/Prompts.h"
+#include "core/settings/AppState.h"
 
 #include <QCoreApplication>
 #include <QDir>

@@ -1,6 +1,6 @@
 // The meter's reply to "?S" (all three formats) and to "?W", as received from the wire.
 #include "FuzzInput.h"
-#include "instrument/StatusReply.h"
+#include "core/instrument/StatusReply.h"
 
 #include <QStringList>
 

@@ -1,8 +1,8 @@
-#include "link/QtSerialLine.h"
-#include "shell/MainWindow.h"
-#include "shell/MessageBoxPrompts.h"
-#include "shell/QtPlatformDialogs.h"
-#include "shell/SystemClock.h"
+#include "core/link/QtSerialLine.h"
+#include "core/settings/SystemClock.h"
+#include "desktop/shell/MainWindow.h"
+#include "desktop/shell/MessageBoxPrompts.h"
+#include "desktop/shell/QtPlatformDialogs.h"
 
 #include <QApplication>
 

@@ -2,12 +2,12 @@
 #include "PdfText.h"
 #include "ScriptedDialogs.h"
 #include "WindowFixture.h"
-#include "help/AboutKvoDialog.h"
-#include "help/AboutTelvioDialog.h"
-#include "help/CatalogDialog.h"
-#include "help/Catalogue.h"
-#include "help/HelpCommands.h"
-#include "help/HelpWindow.h"
+#include "desktop/help/AboutKvoDialog.h"
+#include "desktop/help/AboutTelvioDialog.h"
+#include "desktop/help/CatalogDialog.h"
+#include "desktop/help/Catalogue.h"
+#include "desktop/help/HelpCommands.h"
+#include "desktop/help/HelpWindow.h"
 
 #include <QtTest>
 #include <QtWidgets>

@@ -1,6 +1,6 @@
 // The meter's status replies and the model table, as plain functions on text.
-#include "instrument/ModelTable.h"
-#include "instrument/StatusReply.h"
+#include "core/instrument/ModelTable.h"
+#include "core/instrument/StatusReply.h"
 
 #include <QTest>
 

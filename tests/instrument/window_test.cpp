@@ -1,9 +1,9 @@
 // The status display and the control commands, through the main window and a simulated meter.
-#include "instrument/ModelTable.h"
-#include "instrument/StatusReply.h"
+#include "core/instrument/ModelTable.h"
+#include "core/instrument/StatusReply.h"
+#include "desktop/shell/Twips.h"
 #include "link/QuickWindow.h"
 #include "robustness/ModalDismisser.h"
-#include "shell/Twips.h"
 
 #include <QSignalSpy>
 

@@ -2,7 +2,7 @@
 
 #include "DialogDriver.h"
 #include "WindowFixture.h"
-#include "instrument/InstrumentCommands.h"
+#include "desktop/instrument/InstrumentCommands.h"
 
 #include <QAction>
 #include <QLabel>

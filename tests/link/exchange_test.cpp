@@ -1,8 +1,8 @@
 // The command exchange, the connection and the port dialogs against the simulated meter, and the
 // meter misbehaving on the wire.
-#include "link/Connection.h"
-#include "link/Exchange.h"
-#include "link/PortNames.h"
+#include "core/link/PortNames.h"
+#include "desktop/link/Connection.h"
+#include "desktop/link/Exchange.h"
 #include "link/QuickWindow.h"
 #include "robustness/ModalDismisser.h"
 

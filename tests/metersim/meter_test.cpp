@@ -3,10 +3,10 @@
 // baud rate and records every byte it received, with its time.
 #include "Meter.h"
 #include "RecordFormat.h"
-#include "instrument/StatusReply.h"
-#include "readings/HeaderPosition.h"
-#include "readings/LogLineFormat.h"
-#include "readings/RealTimeLine.h"
+#include "core/instrument/StatusReply.h"
+#include "core/readings/HeaderPosition.h"
+#include "core/readings/LogLineFormat.h"
+#include "core/readings/RealTimeLine.h"
 
 #include <QElapsedTimer>
 #include <QSerialPort>

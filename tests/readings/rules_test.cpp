@@ -1,10 +1,10 @@
 // The readings' text and timing rules without a window: log records, real-time lines, the Log#
 // column, the interval entry and the reading schedule. "-" stands for "no result".
-#include "readings/HeaderPosition.h"
-#include "readings/IntervalRule.h"
-#include "readings/LogLineFormat.h"
-#include "readings/ReadingSchedule.h"
-#include "readings/RealTimeLine.h"
+#include "core/readings/HeaderPosition.h"
+#include "core/readings/IntervalRule.h"
+#include "core/readings/LogLineFormat.h"
+#include "core/readings/ReadingSchedule.h"
+#include "core/readings/RealTimeLine.h"
 
 #include <QtTest>
 

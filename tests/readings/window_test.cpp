@@ -1,14 +1,14 @@
 // The readings commands through the main window and the simulated meter: what goes to the meter,
 // what lands in the workspace (checked against the line rules) and the window afterwards, also
 // when the port vanishes or the line misbehaves in the middle of an operation.
-#include "readings/LogLineFormat.h"
-#include "readings/ReadingCommands.h"
-#include "readings/RealTimeLine.h"
-#include "readings/RealTimeRun.h"
+#include "core/readings/LogLineFormat.h"
+#include "core/readings/ReadingConversions.h"
+#include "core/readings/RealTimeLine.h"
+#include "desktop/readings/ReadingCommands.h"
+#include "desktop/readings/RealTimeRun.h"
 #include "robustness/ModalDismisser.h"
 #include "support/DialogDriver.h"
 #include "support/WindowFixture.h"
-#include "workspace/ReadingConversions.h"
 
 #include <QAction>
 #include <QLabel>

@@ -1,8 +1,8 @@
 // Settings in a temporary store, and the main window offscreen: start-up, initial command
 // states, the save prompt, closing, the wizard and the enabling routines.
 #include "WindowFixture.h"
-#include "shell/Settings.h"
-#include "shell/Twips.h"
+#include "core/settings/Settings.h"
+#include "desktop/shell/Twips.h"
 
 #include <QtTest>
 #include <QtWidgets>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "shell/PlatformDialogs.h"
+#include "desktop/shell/PlatformDialogs.h"
 
 // Platform dialogs that are always cancelled; nothing is ever opened.
 class NoDialogs : public PlatformDialogs {

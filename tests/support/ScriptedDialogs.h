@@ -1,6 +1,6 @@
 #pragma once
 
-#include "shell/PlatformDialogs.h"
+#include "desktop/shell/PlatformDialogs.h"
 
 #include <QList>
 #include <QQueue>

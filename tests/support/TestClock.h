@@ -1,6 +1,6 @@
 #pragma once
 
-#include "shell/SystemClock.h"
+#include "core/settings/SystemClock.h"
 
 // The real clock plus an offset a test can move forward, so waits still end (time passes) while
 // long intervals and midnight are reached without sleeping.

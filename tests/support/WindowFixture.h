@@ -4,9 +4,9 @@
 #include "PromptRecorder.h"
 #include "TestClock.h"
 #include "TestSettings.h"
-#include "link/QtSerialLine.h"
-#include "shell/MainControls.h"
-#include "shell/MainWindow.h"
+#include "core/link/QtSerialLine.h"
+#include "desktop/shell/MainControls.h"
+#include "desktop/shell/MainWindow.h"
 
 #include <Meter.h>
 #include <QTimer>

@@ -1,10 +1,10 @@
 // The workspace's text rules, each as one table: comma-delimited lines, unit and asterisk
 // conversions, reading files back as delimited fields, find, and the default file extension.
-#include "workspace/CommaDelimited.h"
-#include "workspace/DelimitedFieldReader.h"
-#include "workspace/FindText.h"
-#include "workspace/ReadingConversions.h"
-#include "workspace/SaveNames.h"
+#include "core/readings/ReadingConversions.h"
+#include "core/text/CommaDelimited.h"
+#include "core/text/DelimitedFieldReader.h"
+#include "core/text/FindText.h"
+#include "core/text/SaveNames.h"
 
 #include <QTest>
 

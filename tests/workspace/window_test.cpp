@@ -5,8 +5,8 @@
 #include "PdfText.h"
 #include "ScriptedDialogs.h"
 #include "WindowFixture.h"
-#include "shell/Twips.h"
-#include "workspace/CommaDelimited.h"
+#include "core/text/CommaDelimited.h"
+#include "desktop/shell/Twips.h"
 
 #include <QTest>
 #include <QtWidgets>

@@ -1,0 +1,7 @@
+#include "desktop/help/ProgramFolder.h"
+
+#include <QCoreApplication>
+
+QString programFolder() {
+    return QCoreApplication::applicationDirPath();
+}

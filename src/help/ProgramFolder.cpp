@@ -1,7 +1,0 @@
-#include "help/ProgramFolder.h"
-
-#include <QCoreApplication>
-
-QString programFolder() {
-    return QCoreApplication::applicationDirPath();
-}
