@@ -1,5 +1,7 @@
 #include "desktop/link/Connection.h"
 
+#include "core/instrument/StatusQuery.h"
+
 #include "core/link/PortProbe.h"
 #include "core/link/SerialLine.h"
 #include "core/settings/Settings.h"
@@ -65,8 +67,6 @@ void Connection::ConnectMeter() {
         }
         return;
     }
-    s_.commandText = Exchange::wakeUpCommand();
-    s_.readTimeoutSec = 0.1;
     c.tmrDetectMeter->start();
 }
 
@@ -92,16 +92,13 @@ void Connection::tmrDetectMeter_Timer() {
     if (exchange.inProgress())
         return; // a dialog of an earlier exchange is still up; poll again at the next tick
     const MainControls& c = w_.controls();
-    exchange.SerialWrite(s_.commandText);
-    if (!s_.abortRequested)
-        exchange.ReadReply();
-    if (s_.abortRequested) {
-        c.tmrDetectMeter->stop();
-        exchange.ShowCommError();
+    if (!StatusQuery::poll(exchange, s_)) {
+        if (s_.abortRequested) {
+            c.tmrDetectMeter->stop();
+            exchange.ShowCommError();
+        }
         return;
     }
-    if (s_.responseText.isEmpty())
-        return;
     w_.setMessage(QStringLiteral("Device  detected  on  ") + s_.portName + QStringLiteral(" ..."));
     c.tmrDetectMeter->stop();
     w_.instrument().QueryStatus();
