@@ -1,0 +1,96 @@
+// telvio-cli: the meter work of Telvio from a terminal, a script or a scheduled job.
+#include "cli/CliLink.h"
+#include "cli/Commands.h"
+#include "core/settings/Settings.h"
+#include "core/settings/Version.h"
+
+#include <QCommandLineParser>
+#include <QCoreApplication>
+#include <QTextStream>
+
+namespace {
+
+const char* const kAbout =
+    R"(Talks to a conductivity, dissolved-solids or pH meter on a serial port.
+
+Commands:
+  ports    list the serial ports: path, stable name, adapter
+  status   detect the meter and show model, version, serial number, logged readings
+           and what it can do
+
+Port and speed come from --port and --baud, else from the settings the desktop program keeps.
+Every command that talks to the meter first wakes it up, for at most --wait seconds.
+
+Exit codes:
+  0  done
+  2  bad usage
+  3  no meter answered
+  4  port missing, in use or not permitted
+  5  the link failed during the transfer
+  6  the meter reported an error)";
+
+int usage(const QString& text) {
+    complain(text + QStringLiteral(" (see telvio-cli --help)"));
+    return ExitCode::kUsage;
+}
+
+} // namespace
+
+int main(int argc, char* argv[]) {
+    QCoreApplication app(argc, argv);
+    QCoreApplication::setApplicationName(QStringLiteral("telvio-cli"));
+    QCoreApplication::setApplicationVersion(
+        QStringLiteral("%1.%2").arg(telvio::kVersionMajor).arg(telvio::kVersionMinor));
+
+    QCommandLineParser parser;
+    parser.setApplicationDescription(QString::fromLatin1(kAbout));
+    const QCommandLineOption port({"p", "port"}, "Serial port (COM3, ttyUSB0, /dev/...).", "port");
+    const QCommandLineOption baud({"b", "baud"}, "Speed the meter is set to.", "baud");
+    const QCommandLineOption wait("wait", "Seconds to wait for the meter (default 5).", "seconds",
+                                  "5");
+    const QCommandLineOption json("json", "status: machine-readable output.");
+    const QCommandLineOption byId("by-id", "ports: folder of stable port names.", "folder",
+                                  "/dev/serial/by-id");
+    parser.addOptions({port, baud, wait, json, byId});
+    parser.addPositionalArgument("command", "ports or status");
+    parser.addHelpOption();
+    parser.addVersionOption();
+    if (!parser.parse(QCoreApplication::arguments()))
+        return usage(parser.errorText());
+    if (parser.isSet("help")) {
+        QTextStream(stdout) << parser.helpText();
+        return ExitCode::kDone;
+    }
+    if (parser.isSet("version")) {
+        QTextStream(stdout) << "telvio-cli " << QCoreApplication::applicationVersion() << '\n';
+        return ExitCode::kDone;
+    }
+    const QStringList args = parser.positionalArguments();
+    if (args.size() != 1)
+        return usage(QStringLiteral("give one command"));
+    const QString command = args.first();
+    if (command == QLatin1String("ports"))
+        return Commands::ports(parser.value(byId));
+    if (command != QLatin1String("status"))
+        return usage(QStringLiteral("unknown command \"%1\"").arg(command));
+
+    bool ok = true;
+    const double waitSeconds = parser.value(wait).toDouble(&ok);
+    if (!ok || waitSeconds < 0 || waitSeconds > 3600)
+        return usage(QStringLiteral("--wait takes 0 to 3600 seconds"));
+    CliLink link;
+    AppState& state = link.state();
+    Settings::LoadSettings(state, link.prompts());
+    if (parser.isSet(port))
+        Settings::SetPortName(state, parser.value(port));
+    if (parser.isSet(baud)) {
+        state.baudRate = parser.value(baud).toInt(&ok);
+        if (!ok || state.baudRate <= 0)
+            return usage(QStringLiteral("--baud takes a positive whole number"));
+    }
+    if (const int opened = link.open(); opened != ExitCode::kDone)
+        return opened;
+    if (const int found = link.detect(waitSeconds); found != ExitCode::kDone)
+        return found;
+    return Commands::status(link, parser.isSet(json));
+}
