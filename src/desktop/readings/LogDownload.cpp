@@ -1,8 +1,6 @@
 #include "desktop/readings/LogDownload.h"
 
 #include "core/Prompts.h"
-#include "core/readings/LineLayout.h"
-#include "core/readings/LogLineFormat.h"
 #include "core/readings/ReadingSchedule.h"
 #include "core/readings/ReplyWords.h"
 #include "desktop/instrument/InstrumentCommands.h"
@@ -42,16 +40,16 @@ void LogDownload::DownloadLog() {
 
     enterDownloadState();
     s_.stopRequested = false;
-    const End end = LineLayout::fromState(s_).qr32 ? qr32Protocol() : generalProtocol();
-    switch (end) {
-    case End::Complete:
+    lastProgress_ = 0;
+    switch (LogTransfer(w_.exchange(), s_, *this).run()) {
+    case LogTransfer::End::Complete:
         if (!s_.stopRequested)
             finish();
         break;
-    case End::Stopped:
-    case End::ReplyFailed:
+    case LogTransfer::End::Stopped:     // Stop has restored the window already
+    case LogTransfer::End::ReplyFailed: // the window waits for Stop
         break;
-    case End::LinkFailed:
+    case LogTransfer::End::LinkFailed:
         failLink();
         break;
     }
@@ -71,7 +69,7 @@ void LogDownload::enterDownloadState() {
     s_.workspaceText.clear();
 }
 
-void LogDownload::showProgress(long long count) {
+void LogDownload::progress(long long count) {
     const int p = ReadingSchedule::twentieths(count, s_.numLogged);
     if (p <= 20 && p != lastProgress_) {
         QProgressBar* bar = w_.controls().ProgressBar1;
@@ -81,78 +79,9 @@ void LogDownload::showProgress(long long count) {
     }
 }
 
-bool LogDownload::sendRequest(const QString& command) {
-    Exchange& exchange = w_.exchange();
-    exchange.FlushInput();
-    if (s_.abortRequested)
-        return false;
-    s_.commandText = command;
-    exchange.SerialWrite(s_.commandText);
-    return !s_.abortRequested;
-}
-
-std::optional<LogDownload::End> LogDownload::readRecord(long long progressCount) {
-    showProgress(progressCount);
-    w_.exchange().SendCommand();
-    if (s_.abortRequested)
-        return End::LinkFailed;
-    if (replywords::unusable(s_.responseText))
-        return End::ReplyFailed;
-    s_.dataLine = s_.responseText;
-    return std::nullopt;
-}
-
-LogDownload::End LogDownload::generalProtocol() {
-    Exchange& exchange = w_.exchange();
-    Exchange::Scope busy(exchange);
-    const LineLayout layout = LineLayout::fromState(s_);
-    if (!sendRequest(QStringLiteral("?L\r")))
-        return End::LinkFailed;
-
-    long long count = 0;
-    lastProgress_ = 0;
-    for (;;) {
-        if (const auto failed = readRecord(count))
-            return *failed;
-        // Every record is acknowledged, the "ENDS" line too.
-        exchange.SerialWrite(QStringLiteral("A"));
-        if (s_.abortRequested)
-            return End::LinkFailed;
-        if (replywords::has(s_.dataLine, "ENDS"))
-            return End::Complete;
-        const auto line = LogLineFormat::reformat(s_.dataLine, layout);
-        if (!line)
-            return End::LinkFailed;
-        s_.dataLine = *line;
-        s_.workspaceText += *line;
-        s_.workspaceText += QLatin1Char('\n');
-        ++count;
-        // The window stays responsive (and Stop usable) between records.
-        QCoreApplication::processEvents();
-        if (s_.stopRequested)
-            return End::Stopped;
-    }
-}
-
-LogDownload::End LogDownload::qr32Protocol() {
-    Exchange& exchange = w_.exchange();
-    Exchange::Scope busy(exchange);
-    if (!sendRequest(QStringLiteral("?R\r")))
-        return End::LinkFailed;
-
-    // Exactly numLogged records, no acknowledgement and no end marker.
-    const long long total = s_.numLogged;
-    lastProgress_ = 0;
-    for (long long i = 1; i <= total; ++i) {
-        if (const auto failed = readRecord(i))
-            return *failed;
-        const auto line = LogLineFormat::qr32Record(s_.dataLine);
-        if (!line)
-            return End::LinkFailed;
-        s_.dataLine = *line;
-        s_.workspaceText += *line;
-    }
-    return End::Complete;
+bool LogDownload::stopRequested() {
+    QCoreApplication::processEvents();
+    return s_.stopRequested;
 }
 
 void LogDownload::finish() {

@@ -1,13 +1,12 @@
 #pragma once
 
-#include <QString>
-#include <optional>
+#include "core/readings/LogTransfer.h"
 
 class MainWindow;
 struct AppState;
 
 // Logged Data: downloads the meter's log record by record into the log table.
-class LogDownload {
+class LogDownload : private LogTransfer::Listener {
 public:
     explicit LogDownload(MainWindow& window);
 
@@ -15,22 +14,11 @@ public:
     void DownloadLog();
 
 private:
-    enum class End {
-        Complete,    // every record taken: the table is shown
-        Stopped,     // Stop was pressed: it has restored the window already
-        ReplyFailed, // empty, busy or exit reply: the window waits for Stop
-        LinkFailed,  // the link failed or a record could not be laid out
-    };
-
     void enterDownloadState();
-    // Drains the line and writes the request; false when the link failed.
-    bool sendRequest(const QString& command);
-    // Reads one record into dataLine; the way the download ends when it could not.
-    std::optional<End> readRecord(long long progressCount);
-    End generalProtocol();
-    End qr32Protocol();
     // ProgressBar1 in twentieths of numLogged; repainted only when it moves.
-    void showProgress(long long count);
+    void progress(long long count) override;
+    // The window stays responsive (and Stop usable) between records.
+    bool stopRequested() override;
     void finish();
     void failLink();
 
