@@ -73,6 +73,16 @@ std::optional<StatusReply> CliLink::queryStatus() {
     return reply;
 }
 
+void CliLink::adopt(const StatusReply& reply) {
+    if (reply.modelCode)
+        state_.modelCode = *reply.modelCode;
+    state_.percentFormat = reply.format == StatusReply::Format::Percent;
+    state_.isK5Family = reply.isK5Family || reply.format == StatusReply::Format::K5;
+    state_.hasLog = reply.hasLog || reply.format == StatusReply::Format::K5;
+    state_.hasGLP = reply.hasGLP;
+    state_.numLogged = state_.hasLog ? reply.numLogged.value_or(0) : 0;
+}
+
 int CliLink::detect(double waitSeconds) {
     const double end = clock_.nowSeconds() + waitSeconds;
     for (;;) {

@@ -39,6 +39,9 @@ public:
     // The status query after detection (with the longer reply window a woken meter needs).
     // nullopt after saying why; failure() then gives the exit code.
     std::optional<StatusReply> queryStatus();
+    // Takes the meter's identity and layout from a status reply, as the window's status display
+    // does.
+    void adopt(const StatusReply& reply);
     // The exit code for a failed operation: the meter's own error, or a failed link.
     int failure() const { return meterError_ ? ExitCode::kMeterError : ExitCode::kLinkFailed; }
 

@@ -1,8 +1,16 @@
 #pragma once
 
+#include "core/readings/ReadingConversions.h"
+
 #include <QStringList>
 
 class CliLink;
+
+struct LogOptions {
+    ReadingConversions conversions;
+    bool commaDelimited = false;
+    QString output; // empty or "-": standard output
+};
 
 // The subcommands of telvio-cli. Each writes its result to standard output and returns the exit
 // code.
@@ -10,5 +18,6 @@ namespace Commands {
 
 int ports(const QString& byIdFolder);
 int status(CliLink& link, bool json);
+int log(CliLink& link, const LogOptions& options);
 
 } // namespace Commands

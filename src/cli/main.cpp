@@ -17,6 +17,8 @@ Commands:
   ports    list the serial ports: path, stable name, adapter
   status   detect the meter and show model, version, serial number, logged readings
            and what it can do
+  log      download the logged readings and write the log table as the desktop program
+           saves it: plain text, or comma-delimited with --csv
 
 Port and speed come from --port and --baud, else from the settings the desktop program keeps.
 Every command that talks to the meter first wakes it up, for at most --wait seconds.
@@ -49,10 +51,15 @@ int main(int argc, char* argv[]) {
     const QCommandLineOption wait("wait", "Seconds to wait for the meter (default 5).", "seconds",
                                   "5");
     const QCommandLineOption json("json", "status: machine-readable output.");
+    const QCommandLineOption csv("csv", "log: comma-delimited output.");
+    const QCommandLineOption convert(
+        "convert", "log: conversions, any of mS,ppK,asterisk, or none (default: the settings).",
+        "list");
+    const QCommandLineOption output({"o", "output"}, "log: write to this file.", "file");
     const QCommandLineOption byId("by-id", "ports: folder of stable port names.", "folder",
                                   "/dev/serial/by-id");
-    parser.addOptions({port, baud, wait, json, byId});
-    parser.addPositionalArgument("command", "ports or status");
+    parser.addOptions({port, baud, wait, json, csv, convert, output, byId});
+    parser.addPositionalArgument("command", "ports, status or log");
     parser.addHelpOption();
     parser.addVersionOption();
     if (!parser.parse(QCoreApplication::arguments()))
@@ -71,7 +78,7 @@ int main(int argc, char* argv[]) {
     const QString command = args.first();
     if (command == QLatin1String("ports"))
         return Commands::ports(parser.value(byId));
-    if (command != QLatin1String("status"))
+    if (command != QLatin1String("status") && command != QLatin1String("log"))
         return usage(QStringLiteral("unknown command \"%1\"").arg(command));
 
     bool ok = true;
@@ -88,9 +95,25 @@ int main(int argc, char* argv[]) {
         if (!ok || state.baudRate <= 0)
             return usage(QStringLiteral("--baud takes a positive whole number"));
     }
+    LogOptions log;
+    log.conversions = ReadingConversions::fromSettings(state.convertMsToUs, state.convertPpkToPpm,
+                                                       state.convertAsterisks);
+    if (parser.isSet(convert)) {
+        const QStringList words = parser.value(convert).split(u',', Qt::SkipEmptyParts);
+        const QStringList known{"mS", "ppK", "asterisk", "none"};
+        for (const QString& word : words)
+            if (!known.contains(word))
+                return usage(QStringLiteral("--convert takes mS, ppK, asterisk or none"));
+        log.conversions = {words.contains("mS"), words.contains("ppK"), words.contains("asterisk")};
+    }
+    log.commaDelimited = parser.isSet(csv);
+    log.output = parser.value(output);
+
     if (const int opened = link.open(); opened != ExitCode::kDone)
         return opened;
     if (const int found = link.detect(waitSeconds); found != ExitCode::kDone)
         return found;
+    if (command == QLatin1String("log"))
+        return Commands::log(link, log);
     return Commands::status(link, parser.isSet(json));
 }

@@ -1,4 +1,6 @@
 // telvio-cli run as a process against the simulated meter: what it prints, and its exit codes.
+#include "ScriptedDialogs.h"
+#include "WindowFixture.h"
 #include "core/instrument/ModelTable.h"
 #include "core/instrument/StatusReply.h"
 
@@ -49,6 +51,35 @@ private slots:
         }
     }
 
+    // The log the tool writes is byte for byte the file the window saves after a download from
+    // the same meter, as text and comma-delimited, with a conversion on.
+    void logIsTheWindowsSavedFile() {
+        for (const char* name : {"plain", "percent-log", "qr32", "k5ah"}) {
+            ScriptedDialogs dialogs;
+            WindowFixture f(&dialogs);
+            QVERIFY(f.startMeter(name));
+            f.meter->setLogRecords(metersim::Meter::generateLog(f.meter->profile(), 30));
+            f.settings.set("mS", "1");
+            f.createWindow().controls().tmrDetectMeter->setInterval(1);
+            f.start();
+            QVERIFY(f.waitUntil([&] { return !f.state().modelCode.isEmpty(); }));
+            f.c().cmdLoggedData->click();
+            QCOMPARE(f.state().workspaceText.count(name == QString("qr32") ? '\r' : '\n'), 30);
+            f.serial.close(); // the tool needs the port
+            for (const char* format : {"--convert=mS", "--csv"}) {
+                const bool csv = format == QString("--csv");
+                const QString saved = f.settings.folder() + (csv ? "/a.csv" : "/a.txt");
+                dialogs.answerSave(saved, csv);
+                f.c().cmdSaveFile->click();
+                QFile file(saved);
+                QVERIFY(file.open(QIODevice::ReadOnly));
+                const Run r = cli({"log", format, "--convert=mS", "-p", f.meter->portPath()});
+                QCOMPARE(r.code, 0);
+                QCOMPARE(r.out, file.readAll());
+            }
+        }
+    }
+
     void exitCodes() {
         metersim::Meter silent(metersim::profile("plain"));
         QVERIFY(silent.start());
@@ -66,5 +97,5 @@ private slots:
     }
 };
 
-QTEST_GUILESS_MAIN(CliTest)
+QTEST_MAIN(CliTest)
 #include "cli_test.moc"

@@ -1,6 +1,8 @@
 #include "core/instrument/StatusQuery.h"
 
 #include "core/link/CommandExchange.h"
+#include "core/readings/HeaderPosition.h"
+#include "core/readings/ReplyWords.h"
 #include "core/settings/AppState.h"
 
 namespace StatusQuery {
@@ -26,6 +28,12 @@ std::optional<StatusReply> query(CommandExchange& exchange, AppState& state) {
         parseVersionReply(state.responseText, reply);
     }
     return reply;
+}
+
+std::optional<QString> columnHeader(CommandExchange& exchange, AppState& state) {
+    if (!exchange.ExchangeCommand(QStringLiteral("?H")) || replywords::unusable(state.responseText))
+        return std::nullopt;
+    return HeaderPosition::headerFor(state.responseText, state.hasLog);
 }
 
 } // namespace StatusQuery

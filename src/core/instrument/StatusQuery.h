@@ -17,4 +17,8 @@ bool poll(CommandExchange& exchange, AppState& state);
 // the link failed (abortRequested is set).
 std::optional<StatusReply> query(CommandExchange& exchange, AppState& state);
 
+// The meter's column header ("?H") as the log table and its saved file show it; nullopt when the
+// link failed or the meter gave no usable header.
+std::optional<QString> columnHeader(CommandExchange& exchange, AppState& state);
+
 } // namespace StatusQuery

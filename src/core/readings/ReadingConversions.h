@@ -18,6 +18,11 @@ struct ReadingConversions {
     bool ppkToPpm = false;  // "ppK" -> "ppM", value times 1000
     bool asterisks = false; // every "*" -> "." (runs last)
 
+    // The conversions the settings switch on (only 1 means yes).
+    static ReadingConversions fromSettings(qint16 msToUs, qint16 ppkToPpm, qint16 asterisks) {
+        return {msToUs == 1, ppkToPpm == 1, asterisks == 1};
+    }
+
     QString apply(const QString& text) const;
 
     // The replacement for one value field (the characters before a unit): nullopt when the

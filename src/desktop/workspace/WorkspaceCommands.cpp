@@ -75,11 +75,9 @@ void WorkspaceCommands::PrintSetup() {
 
 void WorkspaceCommands::ApplyDataConversions() {
     AppState& s = w_.state();
-    ReadingConversions conversions;
-    conversions.msToUs = s.convertMsToUs == 1;
-    conversions.ppkToPpm = s.convertPpkToPpm == 1;
-    conversions.asterisks = s.convertAsterisks == 1;
-    s.workspaceText = conversions.apply(s.workspaceText);
+    s.workspaceText =
+        ReadingConversions::fromSettings(s.convertMsToUs, s.convertPpkToPpm, s.convertAsterisks)
+            .apply(s.workspaceText);
     w_.controls().RichTextBox1->setPlainText(s.workspaceText);
 }
 

@@ -1,7 +1,7 @@
 #include "desktop/workspace/WorkspaceFiles.h"
 
 #include "core/Prompts.h"
-#include "core/text/CommaDelimited.h"
+#include "core/text/SavedText.h"
 #include "core/text/WorkspaceFileIO.h"
 #include "desktop/shell/MainWindow.h"
 #include "desktop/shell/PlatformDialogs.h"
@@ -67,14 +67,10 @@ WorkspaceFiles::Chosen WorkspaceFiles::AskSaveFileName() {
 // shows, so finding, a later save and a continued run still see the readings as received.
 QString WorkspaceFiles::fileContents(bool commaDelimited) const {
     const AppState& s = w_.state();
-    QString text = s.workspaceText;
-    if ((commaDelimited || s.convertAsterisks == 1) && !w_.controls().mnuGLP->isChecked())
-        text.replace(u'*', u'.');
-    if (commaDelimited)
-        return CommaDelimited::convert(text);
-    if (!w_.controls().lblHeader->text().isEmpty())
-        return s.headerText + QStringLiteral("\r\n") + text;
-    return text;
+    const MainControls& c = w_.controls();
+    return SavedText::contents(s.workspaceText, commaDelimited, s.convertAsterisks == 1,
+                               c.mnuGLP->isChecked(),
+                               c.lblHeader->text().isEmpty() ? QString() : s.headerText);
 }
 
 void WorkspaceFiles::SaveWorkspace() {
