@@ -89,6 +89,14 @@ private slots:
         QVERIFY(none.err.contains("no meter answered"));
         QVERIFY(silent.count("?S\r") >= 1);
         QCOMPARE(cli({"status", "-p", "/dev/no-such-port"}).code, 4);
+        // A meter that vanishes mid-download: the records that came are written, then code 5.
+        metersim::Meter gone(metersim::profile("plain"));
+        QVERIFY(gone.start());
+        gone.setLogRecords(metersim::Meter::generateLog(gone.profile(), 20));
+        gone.vanishAfterSending(7);
+        const Run cut = cli({"log", "-p", gone.portPath()});
+        QCOMPARE(cut.code, 5);
+        QCOMPARE(cut.out.count('\n'), 7);
         for (const QStringList& bad :
              {QStringList{"fly"}, {"status", "--wait", "x"}, {"status", "-b", "0"}, {}})
             QCOMPARE(cli(bad).code, 2);
