@@ -19,5 +19,11 @@ namespace Commands {
 int ports(const QString& byIdFolder);
 int status(CliLink& link, bool json);
 int log(CliLink& link, const LogOptions& options);
+int listen(CliLink& link, bool timestamps);
+// "glp" or "maxmin".
+int records(CliLink& link, bool glp, const LogOptions& options);
+// Writes text to the file (replaced whole) or, for "" and "-", to standard output; false after
+// saying why it could not.
+bool writeOut(const QString& path, const QString& text);
 
 } // namespace Commands

@@ -5,9 +5,7 @@
 #include "core/readings/ReadingConversions.h"
 #include "core/readings/ReadingSchedule.h"
 #include "core/text/SavedText.h"
-#include "core/text/WorkspaceFileIO.h"
 
-#include <QFile>
 #include <cstdio>
 #include <unistd.h>
 
@@ -38,19 +36,6 @@ private:
     int last_ = -1;
 };
 
-bool writeOut(const QString& path, const QString& text) {
-    if (path.isEmpty() || path == QLatin1String("-")) {
-        QFile out;
-        return out.open(stdout, QIODevice::WriteOnly) &&
-               out.write(text.toLatin1()) == text.size() && out.flush();
-    }
-    QString error;
-    if (WorkspaceFileIO::write(path, text, false, error))
-        return true;
-    complain(error);
-    return false;
-}
-
 } // namespace
 
 // The log table as the window would save it after a download: records laid out by the line
@@ -64,7 +49,8 @@ int Commands::log(CliLink& link, const LogOptions& options) {
     link.adopt(*reply);
     if (s.numLogged == 0) {
         complain(QStringLiteral("no logged readings"));
-        return writeOut(options.output, QString()) ? ExitCode::kDone : ExitCode::kLinkFailed;
+        return Commands::writeOut(options.output, QString()) ? ExitCode::kDone
+                                                             : ExitCode::kLinkFailed;
     }
     QString header;
     if (s.percentFormat)
@@ -73,9 +59,9 @@ int Commands::log(CliLink& link, const LogOptions& options) {
     ProgressBar bar(s.numLogged);
     const LogTransfer::End end = LogTransfer(link.exchange(), s, bar).run();
     const QString text = options.conversions.apply(s.workspaceText);
-    const bool written =
-        writeOut(options.output, SavedText::contents(text, options.commaDelimited,
-                                                     options.conversions.asterisks, false, header));
+    const bool written = Commands::writeOut(
+        options.output, SavedText::contents(text, options.commaDelimited,
+                                            options.conversions.asterisks, false, header));
     if (end != LogTransfer::End::Complete) {
         complain(QStringLiteral("the download ended early; the records received are written"));
         return link.failure();

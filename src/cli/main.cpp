@@ -19,6 +19,9 @@ Commands:
            and what it can do
   log      download the logged readings and write the log table as the desktop program
            saves it: plain text, or comma-delimited with --csv
+  glp      the meter's GLP (calibration) records
+  maxmin   the meter's max/min records
+  listen   print what the meter prints, a line as each arrives, until Ctrl+C
 
 Port and speed come from --port and --baud, else from the settings the desktop program keeps.
 Every command that talks to the meter first wakes it up, for at most --wait seconds.
@@ -55,11 +58,14 @@ int main(int argc, char* argv[]) {
     const QCommandLineOption convert(
         "convert", "log: conversions, any of mS,ppK,asterisk, or none (default: the settings).",
         "list");
-    const QCommandLineOption output({"o", "output"}, "log: write to this file.", "file");
+    const QCommandLineOption output({"o", "output"}, "log, glp, maxmin: write to this file.",
+                                    "file");
+    const QCommandLineOption stamps("timestamps",
+                                    "listen: local time (ISO 8601) before each line.");
     const QCommandLineOption byId("by-id", "ports: folder of stable port names.", "folder",
                                   "/dev/serial/by-id");
-    parser.addOptions({port, baud, wait, json, csv, convert, output, byId});
-    parser.addPositionalArgument("command", "ports, status or log");
+    parser.addOptions({port, baud, wait, json, csv, convert, output, stamps, byId});
+    parser.addPositionalArgument("command", "ports, status, log, glp, maxmin or listen");
     parser.addHelpOption();
     parser.addVersionOption();
     if (!parser.parse(QCoreApplication::arguments()))
@@ -78,7 +84,8 @@ int main(int argc, char* argv[]) {
     const QString command = args.first();
     if (command == QLatin1String("ports"))
         return Commands::ports(parser.value(byId));
-    if (command != QLatin1String("status") && command != QLatin1String("log"))
+    const QStringList meterCommands{"status", "log", "glp", "maxmin", "listen"};
+    if (!meterCommands.contains(command))
         return usage(QStringLiteral("unknown command \"%1\"").arg(command));
 
     bool ok = true;
@@ -115,5 +122,9 @@ int main(int argc, char* argv[]) {
         return found;
     if (command == QLatin1String("log"))
         return Commands::log(link, log);
+    if (command == QLatin1String("listen"))
+        return Commands::listen(link, parser.isSet(stamps));
+    if (command != QLatin1String("status"))
+        return Commands::records(link, command == QLatin1String("glp"), log);
     return Commands::status(link, parser.isSet(json));
 }

@@ -8,6 +8,7 @@
 #include <QJsonDocument>
 #include <QJsonObject>
 #include <QProcess>
+#include <QPushButton>
 #include <QTest>
 
 namespace {
@@ -52,9 +53,10 @@ private slots:
     }
 
     // The log the tool writes is byte for byte the file the window saves after a download from
-    // the same meter, as text and comma-delimited, with a conversion on.
+    // the same meter, as text and comma-delimited, with a conversion on; so are GLP and max/min
+    // records where the meter keeps them.
     void logIsTheWindowsSavedFile() {
-        for (const char* name : {"plain", "percent-log", "qr32", "k5ah"}) {
+        for (const char* name : {"plain", "percent-log", "qr32", "k5ah", "qr34"}) {
             ScriptedDialogs dialogs;
             WindowFixture f(&dialogs);
             QVERIFY(f.startMeter(name));
@@ -63,21 +65,45 @@ private slots:
             f.createWindow().controls().tmrDetectMeter->setInterval(1);
             f.start();
             QVERIFY(f.waitUntil([&] { return !f.state().modelCode.isEmpty(); }));
-            f.c().cmdLoggedData->click();
-            QCOMPARE(f.state().workspaceText.count(name == QString("qr32") ? '\r' : '\n'), 30);
-            f.serial.close(); // the tool needs the port
-            for (const char* format : {"--convert=mS", "--csv"}) {
-                const bool csv = format == QString("--csv");
-                const QString saved = f.settings.folder() + (csv ? "/a.csv" : "/a.txt");
-                dialogs.answerSave(saved, csv);
+            // The window saves, then the tool, which needs the port, does the same.
+            auto same = [&](QPushButton* fetch, const QString& file, const QStringList& args) {
+                fetch->click();
+                dialogs.answerSave(f.settings.folder() + file, file.endsWith("csv"));
                 f.c().cmdSaveFile->click();
-                QFile file(saved);
-                QVERIFY(file.open(QIODevice::ReadOnly));
-                const Run r = cli({"log", format, "--convert=mS", "-p", f.meter->portPath()});
-                QCOMPARE(r.code, 0);
-                QCOMPARE(r.out, file.readAll());
-            }
+                QFile saved(f.settings.folder() + file);
+                f.serial.close();
+                const Run r = cli(args + QStringList{"-p", f.meter->portPath()});
+                f.serial.open(f.meter->portPath(), "baud=9600 parity=N data=8 stop=1");
+                return r.code == 0 && saved.open(QIODevice::ReadOnly) && saved.size() > 0 &&
+                       r.out == saved.readAll();
+            };
+            QVERIFY(same(f.c().cmdLoggedData, "/a.txt", {"log", "--convert=mS"}));
+            QCOMPARE(f.state().workspaceText.count(name == QString("qr32") ? '\r' : '\n'), 30);
+            QVERIFY(same(f.c().cmdLoggedData, "/a.csv", {"log", "--csv", "--convert=mS"}));
+            if (name == QString("plain"))
+                QVERIFY(same(f.c().cmdGLPData, "/g.txt", {"glp"}));
+            if (name == QString("qr34"))
+                QVERIFY(same(f.c().cmdMaxMin, "/m.txt", {"maxmin"}));
         }
+    }
+
+    // Listening prints each line as its CR arrives (a script sees it at once), and SIGTERM ends
+    // it as Stop does: "Z" to the meter, exit code 0, every line received written.
+    void listenUntilTerminated() {
+        metersim::Meter meter(metersim::profile("plain"));
+        QVERIFY(meter.start());
+        QProcess p;
+        p.start(TELVIO_CLI_PATH, {"listen", "--timestamps", "-p", meter.portPath()});
+        QVERIFY(QTest::qWaitFor([&] { return meter.count("?S\r") > 0; }, 5000));
+        QTest::qWait(300); // the drain
+        meter.sendUnsolicited("  7.00 pH\r\nERROR\r\n  7.01 pH\r\npart");
+        QVERIFY(QTest::qWaitFor([&] { return p.canReadLine() && p.peek(99).count('\n') == 2; }));
+        p.terminate();
+        QVERIFY(p.waitForFinished(3000) && p.exitCode() == 0 &&
+                meter.waitForReceived("Z", 1, 1000));
+        const QList<QByteArray> lines = p.readAll().split('\n');
+        QCOMPARE(lines.size(), 3);
+        QCOMPARE(lines[1].mid(19), "   7.01 pH"); // after the ISO 8601 time and a space
     }
 
     void exitCodes() {
@@ -100,6 +126,12 @@ private slots:
         for (const QStringList& bad :
              {QStringList{"fly"}, {"status", "--wait", "x"}, {"status", "-b", "0"}, {}})
             QCOMPARE(cli(bad).code, 2);
+        // A meter whose GLP block never ends cannot hold the tool.
+        metersim::Meter endless(metersim::profile("plain"));
+        QVERIFY(endless.start());
+        endless.setRecordLines("?G", QList<QByteArray>(1200, "Std 1  12.88mS\r"));
+        const Run glp = cli({"glp", "-p", endless.portPath()});
+        QVERIFY(glp.code == 5 && glp.out.count('\n') == 1000);
         const Run version = cli({"--version"});
         QVERIFY(version.code == 0 && version.out.startsWith("telvio-cli 1."));
     }

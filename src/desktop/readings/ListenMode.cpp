@@ -1,7 +1,6 @@
 #include "desktop/readings/ListenMode.h"
 
 #include "core/link/SerialLine.h"
-#include "core/readings/ReplyWords.h"
 #include "desktop/link/Exchange.h"
 #include "desktop/readings/WorkspaceLines.h"
 #include "desktop/shell/MainWindow.h"
@@ -48,7 +47,7 @@ void ListenMode::ListenForData() {
         fail();
         return;
     }
-    line_.clear();
+    reader_.clear();
     listening_ = true;
     SerialLine& port = w_.serial();
     bytesConnection_ = connect(&port, &SerialLine::bytesArrived, this, &ListenMode::onBytesArrived);
@@ -79,13 +78,9 @@ void ListenMode::onBytesArrived() {
             }
             const int c = port.readByte();
             if (c > 0) {
-                line_.append(QChar(char16_t(c)));
-                if (c == 13 || line_.size() >= kMaxLineLength) {
-                    s_.dataLine = line_;
-                    if (!replywords::hasAny(line_, {"ENDS", "BUSY", "EXIT", "ERROR"}))
-                        batch += line_;
-                    line_.clear();
-                }
+                if (const auto line = reader_.take(c))
+                    batch += *line;
+                s_.dataLine = reader_.lastLine();
                 continue;
             }
             // A NUL byte also reads as 0: go on while bytes are waiting.
@@ -108,7 +103,7 @@ void ListenMode::stopListening() {
     listening_ = false;
     disconnect(bytesConnection_);
     disconnect(failConnection_);
-    line_.clear();
+    reader_.clear();
 }
 
 void ListenMode::afterStop() {

@@ -1,5 +1,7 @@
 #pragma once
 
+#include "core/readings/ListenReader.h"
+
 #include <QMetaObject>
 #include <QObject>
 #include <QString>
@@ -22,8 +24,6 @@ public:
     // After Stop has restored the window: an empty workspace loses the check mark.
     void afterStop();
 
-    // Longest line kept; a meter that never sends CR cannot grow it further.
-    static constexpr int kMaxLineLength = 4096;
     // Bytes taken in one turn of the event loop.
     static constexpr int kBytesPerTurn = 65536;
 
@@ -37,7 +37,7 @@ private:
     AppState& s_;
     QMetaObject::Connection bytesConnection_;
     QMetaObject::Connection failConnection_;
-    QString line_;
+    ListenReader reader_;
     bool listening_ = false;
     bool reading_ = false;
 };

@@ -1,5 +1,6 @@
 #include "desktop/readings/RecordDownload.h"
 
+#include "core/readings/RecordTransfer.h"
 #include "core/readings/ReplyWords.h"
 #include "desktop/instrument/InstrumentCommands.h"
 #include "desktop/link/Exchange.h"
@@ -49,54 +50,26 @@ void RecordDownload::download(Kind kind) {
         w_.repaint();
     }
 
-    Exchange& exchange = w_.exchange();
-    {
-        Exchange::Scope busy(exchange);
-        exchange.FlushInput();
-        if (!s_.abortRequested) {
-            s_.commandText = glp ? QStringLiteral("?G\r") : QStringLiteral("?M\r");
-            exchange.SerialWrite(s_.commandText);
+    const auto result = RecordTransfer::run(
+        w_.exchange(), s_, glp ? RecordTransfer::Kind::Glp : RecordTransfer::Kind::MaxMin);
+    switch (result.end) {
+    case RecordTransfer::End::Complete:
+        s_.workspaceText = result.text;
+        showBlock(kind);
+        return;
+    case RecordTransfer::End::ReplyFailed:
+        if (!glp)
+            w_.setMessage(QString());
+        return;
+    case RecordTransfer::End::LinkFailed:
+        // The lines that came before the link failed are shown and can be saved.
+        if (!result.text.isEmpty()) {
+            s_.workspaceText = result.text;
+            showBlock(kind);
         }
-        if (s_.abortRequested) {
-            showLinkError(kind);
-            return;
-        }
-        QString text;
-        // The block ends with a line beginning "END" (exactly, in capitals), "ENDS" included.
-        while (s_.responseText.left(3) != QLatin1String("END")) {
-            exchange.SendCommand();
-            if (s_.abortRequested) {
-                // The lines that came before the link failed are shown and can be saved.
-                if (!text.isEmpty()) {
-                    s_.workspaceText = text;
-                    showBlock(kind);
-                }
-                showLinkError(kind);
-                return;
-            }
-            if (replywords::unusable(s_.responseText)) {
-                if (!glp)
-                    w_.setMessage(QString());
-                return;
-            }
-            exchange.SerialWrite(QStringLiteral("\n"));
-            if (s_.abortRequested) {
-                showLinkError(kind);
-                return;
-            }
-            if (s_.responseText.left(3) != QLatin1String("END")) {
-                QString line = s_.responseText;
-                if (line.endsWith(QLatin1Char('\r')))
-                    line.chop(1);
-                if (!glp)
-                    text += QLatin1Char(' ');
-                text += line;
-                text += QLatin1Char('\n');
-            }
-        }
-        s_.workspaceText = text;
+        showLinkError(kind);
+        return;
     }
-    showBlock(kind);
 }
 
 void RecordDownload::showBlock(Kind kind) {
