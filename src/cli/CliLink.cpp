@@ -18,15 +18,7 @@ Prompts::Answer CliLink::show(const QString& text, Icon, Buttons buttons, bool) 
     complain(text);
     if (text.contains(QLatin1String("firmware")) || text.contains(QLatin1String("terminated")))
         meterError_ = true;
-    switch (buttons) {
-    case Buttons::YesNo:
-        return Answer::No;
-    case Buttons::RetryCancel:
-        return Answer::Cancel;
-    case Buttons::Ok:
-        break;
-    }
-    return Answer::Ok;
+    return declined(buttons);
 }
 
 int CliLink::open() {

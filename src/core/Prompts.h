@@ -15,4 +15,17 @@ public:
     // the platform allows it).
     virtual Answer show(const QString& text, Icon icon, Buttons buttons,
                         bool systemModal = false) = 0;
+
+    // The answer of someone who declines: OK, No or Cancel.
+    static Answer declined(Buttons buttons) {
+        switch (buttons) {
+        case Buttons::YesNo:
+            return Answer::No;
+        case Buttons::RetryCancel:
+            return Answer::Cancel;
+        case Buttons::Ok:
+            break;
+        }
+        return Answer::Ok;
+    }
 };

@@ -8,15 +8,7 @@ Prompts::Answer PromptRecorder::show(const QString& text, Icon icon, Buttons but
         onShow(s);
     if (!script_.isEmpty())
         return script_.dequeue();
-    switch (buttons) {
-    case Buttons::YesNo:
-        return Answer::No;
-    case Buttons::RetryCancel:
-        return Answer::Cancel;
-    case Buttons::Ok:
-        break;
-    }
-    return Answer::Ok;
+    return declined(buttons);
 }
 
 QStringList PromptRecorder::texts() const {
