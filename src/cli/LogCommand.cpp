@@ -52,9 +52,10 @@ int Commands::log(CliLink& link, const LogOptions& options) {
         return Commands::writeOut(options.output, QString()) ? ExitCode::kDone
                                                              : ExitCode::kLinkFailed;
     }
-    QString header;
+    bool logColumnKnown = false;
     if (s.percentFormat)
-        header = StatusQuery::columnHeader(link.exchange(), s).value_or(QString());
+        StatusQuery::headerAndPositions(link.exchange(), s, logColumnKnown);
+    const QString header = s.percentFormat ? s.headerText : QString();
     s.workspaceText.clear();
     ProgressBar bar(s.numLogged);
     const LogTransfer::End end = LogTransfer(link.exchange(), s, bar).run();

@@ -30,10 +30,34 @@ std::optional<StatusReply> query(CommandExchange& exchange, AppState& state) {
     return reply;
 }
 
-std::optional<QString> columnHeader(CommandExchange& exchange, AppState& state) {
-    if (!exchange.ExchangeCommand(QStringLiteral("?H")) || replywords::unusable(state.responseText))
-        return std::nullopt;
-    return HeaderPosition::headerFor(state.responseText, state.hasLog);
+void headerAndPositions(CommandExchange& exchange, AppState& state, bool& logColumnKnown) {
+    auto forgetHeader = [&] {
+        state.headerText.clear();
+        state.positionText.clear();
+        logColumnKnown = false;
+    };
+    if (!exchange.ExchangeCommand(QStringLiteral("?H")))
+        return;
+    if (replywords::unusable(state.responseText))
+        return forgetHeader();
+    state.headerText = HeaderPosition::headerFor(state.responseText, state.hasLog);
+    if (!exchange.ExchangeCommand(QStringLiteral("?P")))
+        return;
+    if (replywords::unusable(state.responseText))
+        return forgetHeader();
+    state.positionText = state.responseText;
+    if (!state.hasLog) {
+        state.logColumnWidth = 4;
+        logColumnKnown = false;
+        return;
+    }
+    const HeaderPosition::LogColumn column =
+        HeaderPosition::findLogColumn(state.headerText, state.positionText);
+    logColumnKnown = column.found;
+    if (column.found) {
+        state.logColumnStart = column.start;
+        state.logColumnWidth = column.width;
+    }
 }
 
 } // namespace StatusQuery

@@ -17,8 +17,11 @@ bool poll(CommandExchange& exchange, AppState& state);
 // the link failed (abortRequested is set).
 std::optional<StatusReply> query(CommandExchange& exchange, AppState& state);
 
-// The meter's column header ("?H") as the log table and its saved file show it; nullopt when the
-// link failed or the meter gave no usable header.
-std::optional<QString> columnHeader(CommandExchange& exchange, AppState& state);
+// "?H" and "?P" of a percent-format meter: the column header (as the log table and its saved
+// file show it) and the Log# column that real-time lines number, into the state. logColumnKnown
+// tells whether that column was found; a link failure leaves it alone, an unusable reply forgets
+// header and positions. A header without "Log" or positions with too few fields leave the
+// previous column alone, and real-time lines then keep the meter's own log number.
+void headerAndPositions(CommandExchange& exchange, AppState& state, bool& logColumnKnown);
 
 } // namespace StatusQuery

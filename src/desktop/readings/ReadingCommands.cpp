@@ -1,8 +1,8 @@
 #include "desktop/readings/ReadingCommands.h"
 
+#include "core/instrument/StatusQuery.h"
+
 #include "core/link/SerialLine.h"
-#include "core/readings/HeaderPosition.h"
-#include "core/readings/ReplyWords.h"
 #include "core/settings/Settings.h"
 #include "desktop/link/Exchange.h"
 #include "desktop/readings/ListenMode.h"
@@ -65,42 +65,7 @@ void ReadingCommands::connectControls() {
 }
 
 void ReadingCommands::GetHeaderAndPosition() {
-    Exchange& exchange = w_.exchange();
-    // An unusable reply leaves no header and no Log# column.
-    auto forgetHeader = [this] {
-        s_.headerText.clear();
-        s_.positionText.clear();
-        logColumnKnown_ = false;
-    };
-    if (!exchange.ExchangeCommand(QStringLiteral("?H")))
-        return;
-    if (replywords::unusable(s_.responseText)) {
-        forgetHeader();
-        return;
-    }
-    s_.headerText = HeaderPosition::headerFor(s_.responseText, s_.hasLog);
-
-    if (!exchange.ExchangeCommand(QStringLiteral("?P")))
-        return;
-    if (replywords::unusable(s_.responseText)) {
-        forgetHeader();
-        return;
-    }
-    s_.positionText = s_.responseText;
-    if (!s_.hasLog) {
-        s_.logColumnWidth = 4;
-        logColumnKnown_ = false;
-        return;
-    }
-    // A header without "Log" or positions with too few fields leave the previous column values
-    // alone, and real-time lines then keep the meter's own log number.
-    const HeaderPosition::LogColumn column =
-        HeaderPosition::findLogColumn(s_.headerText, s_.positionText);
-    logColumnKnown_ = column.found;
-    if (column.found) {
-        s_.logColumnStart = column.start;
-        s_.logColumnWidth = column.width;
-    }
+    StatusQuery::headerAndPositions(w_.exchange(), s_, logColumnKnown_);
 }
 
 void ReadingCommands::cmdStopCurrentData_Click() {

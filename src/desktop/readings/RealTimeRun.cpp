@@ -1,5 +1,7 @@
 #include "desktop/readings/RealTimeRun.h"
 
+#include "core/readings/RealTimeReading.h"
+
 #include "core/Prompts.h"
 #include "core/link/SerialLine.h"
 #include "core/readings/LineLayout.h"
@@ -99,42 +101,26 @@ void RealTimeRun::GetCurrentDataReading() {
     Exchange& exchange = w_.exchange();
     if (s_.logInterval >= 3)
         w_.setMessage(countdownText(s_.logInterval));
-    {
-        Exchange::Scope busy(exchange);
-        exchange.FlushInput();
-        if (!s_.abortRequested) {
-            s_.commandText = QStringLiteral("?D\r");
-            exchange.SerialWrite(s_.commandText);
-            s_.commandResent = false;
-            if (!s_.abortRequested)
-                exchange.SendCommand();
-        }
-    }
-    if (s_.abortRequested) {
+    switch (RealTimeReading::request(exchange, s_)) {
+    case RealTimeReading::Outcome::LinkFailed:
         c.tmrDisplayInterval->stop();
         exchange.ShowCommError();
         return;
-    }
-
-    s_.dataLine = s_.responseText;
-    const QString& reply = s_.responseText;
-    if (replywords::has(reply, "ERROR")) {
+    case RealTimeReading::Outcome::MeterError:
         owner_.cmdStopCurrentData_Click();
         return;
-    }
-    if (!replywords::unusable(reply) && !s_.commandResent) {
+    case RealTimeReading::Outcome::Reading:
         acceptReading();
         return;
-    }
-    if (!replywords::has(reply, "BUSY") && s_.commandResent) {
-        // The meter needed the command twice: its timing is unknown, so start again from now.
+    case RealTimeReading::Outcome::Restart:
         c.tmrRealTime->stop();
         c.tmrDisplayInterval->stop();
-        s_.commandResent = false;
         restartRequested_ = true;
         return;
+    case RealTimeReading::Outcome::MeterLost:
+        RealTimeMeterLost();
+        return;
     }
-    RealTimeMeterLost();
 }
 
 void RealTimeRun::acceptReading() {
