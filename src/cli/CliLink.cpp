@@ -8,7 +8,12 @@
 #include <cstdio>
 
 void complain(const QString& text) {
-    std::fprintf(stderr, "telvio-cli: %s\n", text.simplified().toLocal8Bit().constData());
+    // One line, the message's own spacing kept.
+    QString line = text.trimmed();
+    line.replace(QStringLiteral("\r\n"), QStringLiteral(" "))
+        .replace(u'\r', u' ')
+        .replace(u'\n', u' ');
+    std::fprintf(stderr, "telvio-cli: %s\n", line.toLocal8Bit().constData());
     std::fflush(stderr);
 }
 

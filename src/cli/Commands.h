@@ -20,6 +20,8 @@ int ports(const QString& byIdFolder);
 int status(CliLink& link, bool json);
 int log(CliLink& link, const LogOptions& options);
 int listen(CliLink& link, bool timestamps);
+// count 0: until interrupted.
+int read(CliLink& link, int intervalSeconds, int count);
 // "glp" or "maxmin".
 int records(CliLink& link, bool glp, const LogOptions& options);
 // Writes text to the file (replaced whole) or, for "" and "-", to standard output; false after

@@ -22,6 +22,8 @@ Commands:
   glp      the meter's GLP (calibration) records
   maxmin   the meter's max/min records
   listen   print what the meter prints, a line as each arrives, until Ctrl+C
+  read     timed readings, one line each: --interval S (1 to 3600), --count N (default:
+           until Ctrl+C)
 
 Port and speed come from --port and --baud, else from the settings the desktop program keeps.
 Every command that talks to the meter first wakes it up, for at most --wait seconds.
@@ -62,10 +64,13 @@ int main(int argc, char* argv[]) {
                                     "file");
     const QCommandLineOption stamps("timestamps",
                                     "listen: local time (ISO 8601) before each line.");
+    const QCommandLineOption interval("interval", "read: seconds between readings.", "S");
+    const QCommandLineOption count("count", "read: end after N readings.", "N", "0");
     const QCommandLineOption byId("by-id", "ports: folder of stable port names.", "folder",
                                   "/dev/serial/by-id");
-    parser.addOptions({port, baud, wait, json, csv, convert, output, stamps, byId});
-    parser.addPositionalArgument("command", "ports, status, log, glp, maxmin or listen");
+    parser.addOptions(
+        {port, baud, wait, json, csv, convert, output, stamps, interval, count, byId});
+    parser.addPositionalArgument("command", "ports, status, log, glp, maxmin, listen or read");
     parser.addHelpOption();
     parser.addVersionOption();
     if (!parser.parse(QCoreApplication::arguments()))
@@ -84,7 +89,7 @@ int main(int argc, char* argv[]) {
     const QString command = args.first();
     if (command == QLatin1String("ports"))
         return Commands::ports(parser.value(byId));
-    const QStringList meterCommands{"status", "log", "glp", "maxmin", "listen"};
+    const QStringList meterCommands{"status", "log", "glp", "maxmin", "listen", "read"};
     if (!meterCommands.contains(command))
         return usage(QStringLiteral("unknown command \"%1\"").arg(command));
 
@@ -114,6 +119,12 @@ int main(int argc, char* argv[]) {
         log.conversions = {words.contains("mS"), words.contains("ppK"), words.contains("asterisk")};
     }
     log.commaDelimited = parser.isSet(csv);
+    const int seconds = parser.value(interval).toInt(&ok);
+    if (command == QLatin1String("read") && (!ok || seconds < 1 || seconds > 3600))
+        return usage(QStringLiteral("read takes --interval 1 to 3600 (whole seconds)"));
+    const int readings = parser.value(count).toInt(&ok);
+    if (!ok || readings < 0)
+        return usage(QStringLiteral("--count takes a whole number"));
     log.output = parser.value(output);
 
     if (const int opened = link.open(); opened != ExitCode::kDone)
@@ -122,6 +133,8 @@ int main(int argc, char* argv[]) {
         return found;
     if (command == QLatin1String("log"))
         return Commands::log(link, log);
+    if (command == QLatin1String("read"))
+        return Commands::read(link, seconds, readings);
     if (command == QLatin1String("listen"))
         return Commands::listen(link, parser.isSet(stamps));
     if (command != QLatin1String("status"))

@@ -5,6 +5,7 @@
 #include "core/instrument/StatusReply.h"
 
 #include <Meter.h>
+#include <QElapsedTimer>
 #include <QJsonDocument>
 #include <QJsonObject>
 #include <QProcess>
@@ -104,6 +105,24 @@ private slots:
         const QList<QByteArray> lines = p.readAll().split('\n');
         QCOMPARE(lines.size(), 3);
         QCOMPARE(lines[1].mid(19), "   7.01 pH"); // after the ISO 8601 time and a space
+    }
+
+    // Timed readings: one "?D" per reading on the schedule, each laid out and numbered as the
+    // window numbers its lines; the window's interval minimums apply.
+    void readOnSchedule() {
+        metersim::Meter meter(metersim::profile("percent-log"));
+        QVERIFY(meter.start());
+        QElapsedTimer took;
+        took.start();
+        const Run r = cli({"read", "--interval", "1", "--count", "3", "-p", meter.portPath()});
+        QVERIFY(r.code == 0 && took.elapsed() >= 2000 && meter.count("?D\r") == 3);
+        const QList<QByteArray> lines = r.out.split('\n');
+        QVERIFY(lines.size() == 5 && lines[0].contains("Log#"));
+        for (int i = 1; i <= 3; ++i)
+            QCOMPARE(lines[i].mid(lines[0].indexOf("Log#"), 4),
+                     QByteArray::number(i).rightJustified(4));
+        const Run slow = cli({"read", "--interval", "1", "-b", "1200", "-p", meter.portPath()});
+        QVERIFY(slow.code == 2 && slow.err.contains("at 1200  baud"));
     }
 
     void exitCodes() {

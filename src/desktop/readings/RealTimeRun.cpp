@@ -7,7 +7,6 @@
 #include "core/readings/LineLayout.h"
 #include "core/readings/ReadingSchedule.h"
 #include "core/readings/RealTimeLine.h"
-#include "core/readings/ReplyWords.h"
 #include "core/settings/Clock.h"
 #include "desktop/instrument/InstrumentCommands.h"
 #include "desktop/link/Exchange.h"
