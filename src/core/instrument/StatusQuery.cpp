@@ -25,7 +25,8 @@ std::optional<StatusReply> query(CommandExchange& exchange, AppState& state) {
     if (reply.needsVersionQuery) {
         if (!exchange.ExchangeCommand(QStringLiteral("?W")))
             return std::nullopt;
-        parseVersionReply(state.responseText, reply);
+        state.replyText = state.responseText;
+        parseVersionReply(state.replyText, reply);
     }
     return reply;
 }

@@ -2,6 +2,7 @@
 
 #include "core/Prompts.h"
 #include "core/instrument/ModelTable.h"
+#include "core/instrument/StatusQuery.h"
 #include "core/instrument/StatusReply.h"
 #include "desktop/instrument/ControlCommands.h"
 #include "desktop/link/Exchange.h"
@@ -40,12 +41,12 @@ void InstrumentCommands::QueryStatus() {
     Exchange& exchange = w_.exchange();
     // Timer ticks must not start an exchange between the queries of one status display.
     Exchange::Scope busy(exchange);
-    if (!exchange.ExchangeCommand(QStringLiteral("?S"))) {
+    const auto queried = StatusQuery::query(exchange, s_);
+    if (!queried) {
         s_.abortRequested = true;
         return;
     }
-    s_.replyText = s_.responseText;
-    StatusReply reply = parseStatusReply(s_.replyText, s_.modelCode);
+    const StatusReply& reply = *queried;
     const MainControls& c = w_.controls();
     switch (reply.format) {
     case StatusReply::Format::Unusable:
@@ -73,7 +74,7 @@ void InstrumentCommands::QueryStatus() {
     }
 }
 
-void InstrumentCommands::DisplayPlainStatus(StatusReply& reply) {
+void InstrumentCommands::DisplayPlainStatus(const StatusReply& reply) {
     const MainControls& c = w_.controls();
     MainWindow::setTopTwips(c.lblHeader, 1210);
     placeWorkspace(1080, 2510);
@@ -83,12 +84,6 @@ void InstrumentCommands::DisplayPlainStatus(StatusReply& reply) {
         if (reply.numLogged)
             s_.numLogged = *reply.numLogged;
         s_.hasLog = true;
-        if (!w_.exchange().ExchangeCommand(QStringLiteral("?W"))) {
-            s_.abortRequested = true;
-            return;
-        }
-        s_.replyText = s_.responseText;
-        parseVersionReply(s_.replyText, reply);
     }
     if (reply.firmwareVersion)
         s_.firmwareVersion = *reply.firmwareVersion;

@@ -22,7 +22,7 @@ public:
     void QueryStatus();
 
 private:
-    void DisplayPlainStatus(StatusReply& reply);
+    void DisplayPlainStatus(const StatusReply& reply);
     void DisplayK5Status(const StatusReply& reply);
     void DisplayPercentStatus(const StatusReply& reply);
     void ResetStatusDisplay();
