@@ -5,7 +5,24 @@
 
 #include <QFileInfo>
 #include <QThread>
+#include <csignal>
 #include <cstdio>
+
+namespace {
+volatile std::sig_atomic_t interruptSeen = 0;
+void onInterrupt(int) {
+    interruptSeen = 1;
+}
+} // namespace
+
+void catchInterrupts() {
+    std::signal(SIGINT, onInterrupt);
+    std::signal(SIGTERM, onInterrupt);
+}
+
+bool interrupted() {
+    return interruptSeen != 0;
+}
 
 void complain(const QString& text) {
     // One line, the message's own spacing kept.

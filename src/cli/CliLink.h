@@ -61,3 +61,6 @@ private:
 
 // One line on standard error, prefixed with the program's name.
 void complain(const QString& text);
+// Ctrl+C and SIGTERM are noted from then on, so a run can end between lines as Stop ends it.
+void catchInterrupts();
+bool interrupted();

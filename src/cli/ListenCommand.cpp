@@ -3,28 +3,19 @@
 #include "core/readings/ListenReader.h"
 
 #include <QDateTime>
-#include <csignal>
 #include <cstdio>
-
-namespace {
-volatile std::sig_atomic_t interrupted = 0;
-void onInterrupt(int) {
-    interrupted = 1;
-}
-} // namespace
 
 // What the meter prints, a line at a time as each CR arrives, flushed at once so a script (or a
 // file, if the tool is killed) has every line received. Ctrl+C or SIGTERM ends it as Stop does:
 // the meter is sent "Z".
 int Commands::listen(CliLink& link, bool timestamps) {
-    std::signal(SIGINT, onInterrupt);
-    std::signal(SIGTERM, onInterrupt);
+    catchInterrupts();
     AppState& s = link.state();
     if (link.exchange().FlushInput() == CommandExchange::Drain::KeptSending)
         s.abortRequested = s.flushing = false; // a meter already printing: that is the point
     ListenReader reader;
     try {
-        while (!s.abortRequested && !interrupted) {
+        while (!s.abortRequested && !interrupted()) {
             // A short wait, so an interrupt is seen within a fifth of a second.
             if (!link.line().waitForByte(200))
                 continue;

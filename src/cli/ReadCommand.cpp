@@ -9,24 +9,19 @@
 #include "core/settings/SystemClock.h"
 
 #include <QThread>
-#include <csignal>
 #include <cstdio>
 
 namespace {
-volatile std::sig_atomic_t interrupted = 0;
-void onInterrupt(int) {
-    interrupted = 1;
-}
 
 // Sleeps until the monotonic time due, a fifth of a second at most at a time, so an interrupt
 // is seen at once. False when interrupted.
 bool sleepUntil(const Clock& clock, double due) {
     for (double rest = due - clock.nowSeconds(); rest > 0; rest = due - clock.nowSeconds()) {
-        if (interrupted)
+        if (interrupted())
             return false;
         QThread::usleep(static_cast<unsigned long>(qMin(rest, 0.2) * 1e6));
     }
-    return !interrupted;
+    return !interrupted();
 }
 
 void print(const QString& line) {
@@ -58,8 +53,7 @@ int Commands::read(CliLink& link, int intervalSeconds, int count) {
         if (!s.headerText.isEmpty())
             print(QString(s.headerText).remove(u'\r'));
     }
-    std::signal(SIGINT, onInterrupt);
-    std::signal(SIGTERM, onInterrupt);
+    catchInterrupts();
     SystemClock clock;
     double start = clock.nowSeconds();
     int lines = 0;
