@@ -1,14 +1,16 @@
 #!/usr/bin/env bash
-# Installs every Debian package that the build, the tests and the demo need.
+# Installs every Debian package that the build, the tests and the demo need; with --tests only
+# what the build and the tests need (no display server or picture tools).
 # Idempotent and non-interactive; run as root (or with sudo available).
 set -euo pipefail
 
 PACKAGES=(
     cmake ninja-build g++ ccache pkg-config
     qt6-base-dev qt6-serialport-dev libgl-dev
-    xvfb xdotool x11-apps imagemagick poppler-utils fonts-liberation
+    poppler-utils fonts-liberation
     clang-14 libclang-rt-14-dev
 )
+[ "${1:-}" = "--tests" ] || PACKAGES+=(xvfb xdotool x11-apps imagemagick)
 
 missing=()
 for p in "${PACKAGES[@]}"; do

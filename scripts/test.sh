@@ -4,7 +4,7 @@
 set -euo pipefail
 top="$(cd "$(dirname "$0")/.." && pwd)"
 cd "$top"
-bash scripts/deps.sh
+bash scripts/deps.sh --tests
 export QT_QPA_PLATFORM=offscreen
 jobs="$(nproc)"
 # Build folders may move between machines and checkouts: let ccache match them anyway.
