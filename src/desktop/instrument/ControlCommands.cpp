@@ -1,5 +1,8 @@
 #include "desktop/instrument/ControlCommands.h"
 
+#include "core/instrument/MeterControl.h"
+#include "core/readings/ReplyWords.h"
+
 #include "core/Prompts.h"
 #include "core/instrument/ModelTable.h"
 #include "core/link/SerialLine.h"
@@ -14,33 +17,12 @@
 #include <QMenu>
 #include <QPlainTextEdit>
 #include <QPushButton>
-#include <QThread>
 #include <QTimer>
 
 namespace {
-bool containsWord(const QString& text, const char* word) {
-    return text.contains(QLatin1String(word), Qt::CaseInsensitive);
-}
-
-// A reply a command can act on: not busy, not ended at the meter, not rejected, not empty.
-bool isUsable(const QString& reply) {
-    return !reply.isEmpty() && !containsWord(reply, "BUSY") && !containsWord(reply, "EXIT") &&
-           !containsWord(reply, "ERROR");
-}
-
 // The workspace control turns a CR into a line break; compare texts the way it shows them.
 QString asShown(QString text) {
     return text.replace(u'\r', u'\n');
-}
-
-QString trimSpaces(const QString& text) {
-    qsizetype first = 0;
-    qsizetype last = text.size();
-    while (first < last && text[first] == u' ')
-        ++first;
-    while (last > first && text[last - 1] == u' ')
-        --last;
-    return text.mid(first, last - first);
 }
 } // namespace
 
@@ -75,26 +57,26 @@ bool ControlCommands::runCommand(const QString& command) {
 void ControlCommands::cmdStartStirring_Click() {
     if (!runCommand(QStringLiteral("?M")))
         return;
-    if (s_.responseText.startsWith(u"BLOW"))
+    if (MeterControl::batteryTooLow(s_.responseText))
         w_.prompts().show(QStringLiteral("Meter  battery  is  low!"), Prompts::Icon::Critical,
                           Prompts::Buttons::Ok);
-    if (s_.responseText.startsWith(u"SON"))
+    if (MeterControl::stirrerStarted(s_.responseText))
         w_.setMessage(QStringLiteral("Stirrer  started."));
 }
 
 void ControlCommands::cmdStopStirring_Click() {
-    if (runCommand(QStringLiteral("?N")) && s_.responseText.startsWith(u"SOFF"))
+    if (runCommand(QStringLiteral("?N")) && MeterControl::stirrerStopped(s_.responseText))
         w_.setMessage(QStringLiteral("Stirrer  stopped."));
 }
 
 void ControlCommands::cmdEnableLogging_Click() {
     const QString command = modeltable::enableLoggingCommand(s_.modelCode, s_.percentFormat);
-    if (runCommand(command) && containsWord(s_.responseText, "LOG START"))
+    if (runCommand(command) && MeterControl::loggingStarted(s_.responseText))
         w_.setMessage(QStringLiteral("Logging  enabled."));
 }
 
 void ControlCommands::cmdDisableLogging_Click() {
-    if (runCommand(QStringLiteral("?F")) && containsWord(s_.responseText, "LOG STOP"))
+    if (runCommand(QStringLiteral("?F")) && MeterControl::loggingStopped(s_.responseText))
         w_.setMessage(QStringLiteral("Logging  disabled."));
 }
 
@@ -102,30 +84,11 @@ void ControlCommands::cmdK5Off_Click() {
     w_.StopVoltageDisplay();
     // "Shutting" also gives the reply to "?K" the long reply window.
     w_.setMessage(QStringLiteral("Shutting  down  meter ..."));
-    Exchange& exchange = w_.exchange();
-    {
-        Exchange::Scope busy(exchange);
-        // Wake the meter; its status reply is drained rather than awaited.
-        s_.commandText = Exchange::wakeUpCommand();
-        exchange.SerialWrite(s_.commandText);
-        if (!s_.abortRequested)
-            exchange.FlushInput();
-        if (!s_.abortRequested) {
-            QThread::msleep(500);
-            exchange.FlushInput();
-        }
-        if (!s_.abortRequested) {
-            s_.commandText = QStringLiteral("?K\r");
-            exchange.SerialWrite(s_.commandText);
-        }
-        if (!s_.abortRequested)
-            exchange.SendCommand();
-    }
-    if (s_.abortRequested) {
-        exchange.ShowCommError();
+    if (!MeterControl::powerOff(w_.exchange(), s_)) {
+        w_.exchange().ShowCommError();
         return;
     }
-    if (s_.responseText.startsWith(u"SSD"))
+    if (MeterControl::poweredOff(s_.responseText))
         enterShutdownState();
 }
 
@@ -162,8 +125,7 @@ void ControlCommands::cmdEraseLog_Click() {
         w_.exchange().ShowCommError();
         return;
     }
-    if (s_.responseText.isEmpty() || containsWord(s_.responseText, "BUSY") ||
-        containsWord(s_.responseText, "EXIT") || containsWord(s_.replyText, "ERROR"))
+    if (replywords::unusable(s_.responseText) || replywords::has(s_.replyText, "ERROR"))
         return;
     if (s_.numLogged == 0) {
         w_.prompts().show(QStringLiteral("No logged readings to erase!"),
@@ -184,7 +146,7 @@ void ControlCommands::eraseConfirmed(LogEraseCheckDialog& dialog) {
         exchange.ShowCommError();
         return;
     }
-    if (!isUsable(s_.responseText) || !s_.responseText.startsWith(u"ERASED"))
+    if (!MeterControl::logErased(s_.responseText))
         return;
     s_.numLogged = 0;
     w_.controls().lblNumLogData->setText(QStringLiteral("0"));
@@ -217,11 +179,11 @@ void ControlCommands::tmrDisplayVoltage_Timer() {
         voltageLinkFailed();
         return;
     }
-    if (!isUsable(s_.responseText)) {
+    if (!MeterControl::isUsable(s_.responseText)) {
         c.tmrDisplayVoltage->stop();
         return;
     }
-    s_.workspaceText = QStringLiteral("Meter Battery Voltage = ") + trimSpaces(s_.responseText);
+    s_.workspaceText = MeterControl::voltageLine(s_.responseText);
     // An unchanged voltage leaves the workspace alone, so it does not flicker every 2 s.
     if (c.RichTextBox1->toPlainText() != asShown(s_.workspaceText))
         c.RichTextBox1->setPlainText(s_.workspaceText);
