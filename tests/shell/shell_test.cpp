@@ -49,6 +49,8 @@ private slots:
         AppState s;
         PromptRecorder p;
         bool first = false;
+        // Only a caller that asks about the first start marks it done (the CLI does not ask).
+        QVERIFY(Settings::LoadSettings(s, p) && t.firstRunValue().isEmpty());
         QVERIFY(Settings::LoadSettings(s, p, &first) && first);
         QCOMPARE(fields(s), "\\\\.\\COM1 9600 1 0 0 0 d:");
         QVERIFY(Settings::LoadSettings(s, p, &first) && !first);

@@ -116,9 +116,9 @@ bool LoadSettings(AppState& state, Prompts& prompts, bool* firstRun) {
             state.settingsFileBroken = true;
             throw ConversionError("settings file cannot be parsed");
         }
-        const bool first = IsFirstRun();
+        // Asking marks the first start done, so only a caller that runs the wizard asks.
         if (firstRun)
-            *firstRun = first;
+            *firstRun = IsFirstRun();
     } catch (const std::exception&) {
         prompts.show(QString::fromLatin1(kRetrieveError), Prompts::Icon::Information,
                      Prompts::Buttons::Ok);

@@ -16,7 +16,8 @@ inline constexpr const char* kSaveError = "An error occured while saving program
 // with a message; keys read before keep their new values. A settings file that cannot be parsed
 // gives the message too, after every key was read (what the file still holds, else the
 // defaults). Returns false after such a failure, true otherwise. Does not run the setup wizard
-// (the caller does, when firstRun is reported; it is not reported after a failure).
+// (the caller does, when firstRun is reported; it is not reported after a failure). Only a caller
+// that passes firstRun has the first start marked done.
 bool LoadSettings(AppState& state, Prompts& prompts, bool* firstRun = nullptr);
 // Writes all seven settings in their fixed order; a failure stops with a message. A settings
 // file that cannot be parsed is first renamed (same folder, ".broken-" and a time stamp added,
