@@ -4,6 +4,7 @@
 #include "desktop/help/CatalogDialog.h"
 #include "desktop/help/Catalogue.h"
 #include "desktop/help/MakerContact.h"
+#include "desktop/help/OkButtonRow.h"
 
 #include <QDir>
 #include <QEvent>
@@ -76,13 +77,7 @@ AboutKvoDialog::AboutKvoDialog(AppState& state, Prompts& prompts, PlatformDialog
     links->addWidget(catalogue_, 2, 1);
     links->setColumnStretch(1, 1);
 
-    auto* ok = new QPushButton(QStringLiteral("&OK"), this);
-    ok->setObjectName(QStringLiteral("cmdOK"));
-    ok->setDefault(true);
-    connect(ok, &QPushButton::clicked, this, &QDialog::accept);
-    auto* buttons = new QHBoxLayout;
-    buttons->addStretch(1);
-    buttons->addWidget(ok);
+    QHBoxLayout* buttons = okButtonRow(this, QStringLiteral("&OK"));
 
     auto* layout = new QVBoxLayout(this);
     layout->addWidget(splash_);

@@ -2,10 +2,10 @@
 
 #include "core/settings/Version.h"
 #include "desktop/help/MakerContact.h"
+#include "desktop/help/OkButtonRow.h"
 
 #include <QHBoxLayout>
 #include <QLabel>
-#include <QPushButton>
 #include <QVBoxLayout>
 
 AboutTelvioDialog::AboutTelvioDialog(QWidget* parent) : QDialog(parent) {
@@ -27,13 +27,7 @@ AboutTelvioDialog::AboutTelvioDialog(QWidget* parent) : QDialog(parent) {
     auto* notice = new QLabel(QString::fromUtf8(MakerContact::kNotice), this);
     notice->setObjectName(QStringLiteral("Label2"));
 
-    auto* ok = new QPushButton(QStringLiteral("OK"), this);
-    ok->setObjectName(QStringLiteral("cmdOK"));
-    ok->setDefault(true);
-    connect(ok, &QPushButton::clicked, this, &QDialog::accept);
-    auto* buttons = new QHBoxLayout;
-    buttons->addStretch(1);
-    buttons->addWidget(ok);
+    QHBoxLayout* buttons = okButtonRow(this, QStringLiteral("OK"));
 
     auto* layout = new QVBoxLayout(this);
     layout->addWidget(name);
